@@ -1,0 +1,4 @@
+// vdf
+#include "keltools.h"
+
+int VdfMain(int, char **) { return CommandNotBuilt("vdf"); }

@@ -1,0 +1,4 @@
+// vdu
+#include "keltools.h"
+
+int VduMain(int, char **) { return CommandNotBuilt("vdu"); }

@@ -1,0 +1,4 @@
+// amldump
+#include "keltools.h"
+
+int AmldumpMain(int, char **) { return CommandNotBuilt("amldump"); }

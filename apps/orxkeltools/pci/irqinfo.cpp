@@ -1,0 +1,4 @@
+// irqinfo
+#include "keltools.h"
+
+int InterruptInfo(int, char **) { return CommandNotBuilt("irqinfo"); }

@@ -1,0 +1,4 @@
+// lspci
+#include "keltools.h"
+
+int ListPCI(int, char **) { return CommandNotBuilt("lspci"); }

@@ -1,0 +1,4 @@
+// pci-info
+#include "keltools.h"
+
+int PciInfoMain(int, char **) { return CommandNotBuilt("pci-info"); }

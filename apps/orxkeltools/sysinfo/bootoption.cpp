@@ -1,0 +1,4 @@
+// bootOption
+#include "keltools.h"
+
+int BootOptionMain(int, char **) { return CommandNotBuilt("bootOption"); }

@@ -1,0 +1,4 @@
+// hwclock
+#include "keltools.h"
+
+int HwclockMain(int, char **) { return CommandNotBuilt("hwclock"); }

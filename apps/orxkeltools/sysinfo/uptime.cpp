@@ -1,0 +1,4 @@
+// uptime
+#include "keltools.h"
+
+int UptimeMain(int, char **) { return CommandNotBuilt("uptime"); }

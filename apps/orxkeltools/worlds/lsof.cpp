@@ -1,0 +1,4 @@
+// lsof
+#include "keltools.h"
+
+int LsofMain(int, char **) { return CommandNotBuilt("lsof"); }

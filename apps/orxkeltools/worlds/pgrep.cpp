@@ -1,0 +1,4 @@
+// pgrep
+#include "keltools.h"
+
+int PgrepMain(int, char **) { return CommandNotBuilt("pgrep"); }

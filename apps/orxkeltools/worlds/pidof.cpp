@@ -1,0 +1,4 @@
+// pidof
+#include "keltools.h"
+
+int PidofMain(int, char **) { return CommandNotBuilt("pidof"); }

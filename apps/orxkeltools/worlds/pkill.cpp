@@ -1,0 +1,4 @@
+// pkill
+#include "keltools.h"
+
+int PkillMain(int, char **) { return CommandNotBuilt("pkill"); }

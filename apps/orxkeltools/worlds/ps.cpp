@@ -1,0 +1,4 @@
+// ps
+#include "keltools.h"
+
+int PsMain(int, char **) { return CommandNotBuilt("ps"); }

@@ -1,0 +1,4 @@
+// userspaceof
+#include "keltools.h"
+
+int UserspaceofMain(int, char **) { return CommandNotBuilt("userspaceof"); }

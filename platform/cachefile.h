@@ -1,0 +1,150 @@
+// Cache files: a saved KEL tree, mmap'd and indexed.
+//
+// Layout (all integers little-endian):
+//
+//   0   8  magic "ORXKELC1"
+//   8   4  format version (1)
+//  12   4  flags (0)
+//  16  16  tree signature
+//  32  24  kernel build date, NUL-padded (at most 20 characters)
+//  56   4  entry count N
+//  60   4  index offset
+//  64   8  total file size
+//  72   8  checksum of bytes 80 .. total size
+//  80      index: N entries of 20 bytes, sorted by their key bytes
+//          (memcmp order, a shorter key first on a common prefix):
+//            0 key offset, 4 key length, 8 status, 12 data offset, 16 data length
+//          then the key bytes and the data bytes the entries point at.
+//
+// A key is: operation (1 byte), node number (2 bytes), then each instance
+// key as kind (1 byte) and either a 64-bit value (kind other than 1) or a
+// 32-bit length and the text bytes (kind 1).
+//
+// Operations and their data:
+//   'G' read:     the stored record (shorter than asked: zero-filled; longer: cut)
+//   'L' listing:  a 32-bit count, then the keys in listing order
+//   'S' set:      no data; the status is what KEL_Set answers
+//   'D' data:     32-bit read status, 32-bit chunk limit (most bytes one
+//                 KEL_SetData returns; 0xffffffff for no limit), the content;
+//                 the entry's status is what KEL_GetDataLength answers
+//   'M' meta:     node 0, one text key naming the setting; data is its text
+// A non-zero status makes the call fail with it.
+#ifndef PLATFORM_CACHEFILE_H
+#define PLATFORM_CACHEFILE_H
+
+#include <cstdint>
+#include <cstring>
+#include <optional>
+#include <span>
+#include <string>
+#include <string_view>
+#include <unordered_set>
+#include <vector>
+
+#include "kel/kel.h"
+
+namespace kelplat {
+
+enum class Op : uint8_t { Get = 'G', List = 'L', Set = 'S', Data = 'D', Meta = 'M' };
+
+constexpr char kCacheMagic[8] = {'O', 'R', 'X', 'K', 'E', 'L', 'C', '1'};
+constexpr uint32_t kCacheVersion = 1;
+constexpr size_t kHeaderSize = 80;
+constexpr size_t kIndexEntrySize = 20;
+constexpr size_t kBuildDateMax = 20;
+
+inline uint32_t LoadU32(const uint8_t *p) {
+   return uint32_t(p[0]) | uint32_t(p[1]) << 8 | uint32_t(p[2]) << 16 | uint32_t(p[3]) << 24;
+}
+inline uint64_t LoadU64(const uint8_t *p) { return LoadU32(p) | uint64_t(LoadU32(p + 4)) << 32; }
+inline void StoreU32(uint8_t *p, uint32_t v) {
+   for (int i = 0; i < 4; i++) p[i] = uint8_t(v >> (8 * i));
+}
+inline void StoreU64(uint8_t *p, uint64_t v) {
+   StoreU32(p, uint32_t(v));
+   StoreU32(p + 4, uint32_t(v >> 32));
+}
+void AppendU32(std::string &out, uint32_t v);
+void AppendU64(std::string &out, uint64_t v);
+
+// One instance key as stored: kind 1 carries text, any other kind a value.
+struct Key {
+   uint32_t kind = KEL_PARAM_INT;
+   uint64_t value = 0;
+   std::string text;
+   bool operator==(const Key &) const = default;
+};
+
+void AppendKey(std::string &out, const Key &key);
+std::string EncodeLookup(Op op, KEL_Node node, std::span<const Key> keys);
+// The lookup key for a parameter list, or nothing when an entry cannot be encoded.
+std::optional<std::string> EncodeLookup(Op op, KEL_Node node, const KEL_ParamList *keys);
+// Decodes one key at *pos of bytes; false when it runs past the end.
+bool DecodeKey(std::string_view bytes, size_t *pos, Key *key);
+// Decodes a listing payload; false when malformed.
+bool DecodeList(std::string_view bytes, std::vector<Key> *keys);
+std::string EncodeList(std::span<const Key> keys);
+
+uint64_t Checksum(const uint8_t *p, size_t n);
+
+// Builds a cache file in memory.
+class CacheWriter {
+public:
+   // False when the same lookup key was added before.
+   bool Add(std::string lookup, uint32_t status, std::string data);
+   // The file bytes; the build date is cut to kBuildDateMax characters.
+   std::string Finish(std::span<const uint8_t, 16> signature, std::string_view buildDate) const;
+   size_t size() const { return entries_.size(); }
+
+private:
+   struct Entry {
+      std::string key;
+      uint32_t status;
+      std::string data;
+   };
+   std::vector<Entry> entries_;
+   std::unordered_set<std::string> keys_;
+};
+
+// One looked-up entry of an open cache.
+struct CacheHit {
+   uint32_t status;
+   std::string_view data;
+};
+
+// Reads a cache file (mapped, or bytes owned elsewhere).  Every offset is
+// checked before use; a bad one makes the lookup fail with
+// KEL_STATUS_CACHE_CORRUPT.
+class CacheReader {
+public:
+   CacheReader() = default;
+   CacheReader(const CacheReader &) = delete;
+   CacheReader &operator=(const CacheReader &) = delete;
+   ~CacheReader();
+
+   KEL_Status Open(const char *path, int flags);
+   // Checks the bytes as Open does; the caller keeps them alive.
+   KEL_Status Attach(std::string_view bytes, int flags);
+
+   // Status NOT_FOUND when absent, CACHE_CORRUPT when the index is damaged.
+   KEL_Status Lookup(std::string_view key, CacheHit *hit) const;
+
+   std::span<const uint8_t, 16> Signature() const;
+   std::string BuildDate() const;
+   uint32_t EntryCount() const { return count_; }
+   // Entry i in index order: its key, status and data; false when damaged.
+   bool EntryAt(uint32_t i, std::string_view *key, CacheHit *hit) const;
+   std::string_view Bytes() const { return bytes_; }
+
+private:
+   void Close();
+   std::string_view bytes_;
+   void *map_ = nullptr;
+   size_t mapSize_ = 0;
+   uint32_t count_ = 0;
+   uint32_t indexOffset_ = 0;
+};
+
+}  // namespace kelplat
+
+#endif

@@ -1,0 +1,35 @@
+// Platform internals shared between its sources.
+#ifndef PLATFORM_INTERNAL_H
+#define PLATFORM_INTERNAL_H
+
+#include <cstdint>
+#include <vector>
+
+#include "kel/kel.h"
+
+// A parameter list entry.  The kind is the first 32-bit word, as callers rely on.
+struct KEL_Param {
+   uint32_t kind;
+   uint32_t reserved;
+   uint64_t value;
+   char *text;  // owned; set for KEL_PARAM_STRING entries
+};
+
+struct KEL_ParamList {
+   std::vector<KEL_Param> entries;
+};
+
+// Data object: word 0 the capacity, word 1 the number of bytes held.
+struct KELData {
+   uint32_t capacity;
+   uint32_t length;
+   uint8_t *bytes;
+};
+
+namespace kelplat {
+// Appends an entry of any kind (used for keys read back from a cache file).
+KEL_Status ParamListAppend(KEL_ParamList *list, uint32_t kind, uint64_t value, const char *text,
+                           size_t textLength);
+}
+
+#endif
