@@ -1,4 +1,192 @@
-// amldump
-#include "keltools.h"
+// amldump: writes each ACPI table of the KEL tree to "<signature>.aml" in
+// the current directory, never overwriting a file.
+#include <fcntl.h>
+#include <unistd.h>
 
-int AmldumpMain(int, char **) { return CommandNotBuilt("amldump"); }
+#include <cctype>
+#include <cerrno>
+#include <cstdint>
+#include <cstdio>
+#include <new>
+#include <string_view>
+
+#include "keltools.h"
+#include "records.h"
+
+namespace {
+
+// Table buffer record (KEL_NODE_hardware_acpi_tables_buffers, 131084 bytes):
+//
+//    0 table signature, 4 characters
+//    4 set to NUL here, so that bytes 0..4 are the signature as a text
+//    5 length of this buffer's data  u32 (not aligned)
+//    9 the data: its first "length" bytes are the next piece of the table
+constexpr uint32_t kRecordSize = 131084;
+constexpr size_t kSignature = 0;
+constexpr size_t kSignatureEnd = 4;
+constexpr size_t kLength = 5;
+constexpr size_t kData = 9;
+constexpr uint32_t kDataMax = kRecordSize - kData;
+
+// Never replace an existing file: the open fails instead.
+constexpr int kOpenFlags = O_WRONLY | O_CREAT | O_EXCL | O_TRUNC;
+constexpr mode_t kOpenMode = 0600;
+
+// Counts the tables seen per signature, in a singly linked list: ACPI
+// tables are few, and the list gives the allocation failure its own answer.
+struct SignatureCounter {
+   struct Node {
+      Node *next;
+      char signature[5];
+      int32_t count;
+   };
+   Node *head = nullptr;
+   Node **tail = &head;
+
+   SignatureCounter() = default;
+   SignatureCounter(const SignatureCounter &) = delete;
+   SignatureCounter &operator=(const SignatureCounter &) = delete;
+   ~SignatureCounter() {
+      while (head != nullptr) {
+         Node *next = head->next;
+         delete head;
+         head = next;
+      }
+   }
+
+   // How many tables had this signature before (0 for the first), or -12
+   // (the negated ENOMEM) when a new signature cannot be recorded.
+   int32_t Next(std::string_view signature) {
+      for (Node *n = head; n != nullptr; n = n->next)
+         if (signature == n->signature) return n->count++;
+      Node *n = new (std::nothrow) Node{nullptr, {}, 1};
+      if (n == nullptr) return -ENOMEM;
+      signature.copy(n->signature, sizeof n->signature - 1);
+      *tail = n;
+      tail = &n->next;
+      return 0;
+   }
+};
+
+// Closes the table file on every path.
+struct FileCloser {
+   int fd = -1;
+   ~FileCloser() {
+      if (fd >= 0) close(fd);
+   }
+};
+
+// A signature becomes a file name in the current directory: one holding a
+// '/', or one that is empty, "." or "..", could name a file elsewhere or an
+// odd one, and is refused.
+bool SafeSignature(std::string_view signature) {
+   return !signature.empty() && signature.find('/') == std::string_view::npos && signature != "." &&
+          signature != "..";
+}
+
+// Writes the signature for a message, other than printable bytes as \xNN.
+void PrintSignature(std::string_view signature) {
+   for (char ch : signature) {
+      unsigned char c = static_cast<unsigned char>(ch);
+      if (std::isprint(c) && c != '\\')
+         std::fputc(c, stderr);
+      else
+         std::fprintf(stderr, "\\x%02x", c);
+   }
+}
+
+// Writes all of data to fd; false after reporting a failed write.
+bool WriteAll(int fd, const uint8_t *data, size_t length) {
+   while (length > 0) {
+      ssize_t n = write(fd, data, length);
+      if (n < 0) {
+         std::perror("amldump: ");
+         return false;
+      }
+      data += n;
+      length -= size_t(n);
+   }
+   return true;
+}
+
+// Starts the table's file from its first buffer record: names it after the
+// signature and opens it.  False after reporting a failure.
+bool OpenTableFile(uint8_t *record, int32_t table, SignatureCounter *counter, FileCloser *file) {
+   record[kSignatureEnd] = 0;
+   std::string_view signature = ReadText(record, kSignature, kSignatureEnd - kSignature);
+   if (!SafeSignature(signature)) {
+      std::fprintf(stderr, "amldump: table %d has the unsafe signature \"", table);
+      PrintSignature(signature);
+      std::fputs("\"; nothing written for it\n", stderr);
+      return false;
+   }
+   int32_t seen = counter->Next(signature);
+   char name[32];
+   if (seen == 0)
+      std::snprintf(name, sizeof name, "%.*s.aml", int(signature.size()), signature.data());
+   else
+      std::snprintf(name, sizeof name, "%.*s-%d.aml", int(signature.size()), signature.data(), seen);
+   std::printf("Writing file %s\n", name);
+   file->fd = open(name, kOpenFlags, kOpenMode);
+   if (file->fd < 0) {
+      std::perror("amldump: ");
+      return false;
+   }
+   return true;
+}
+
+// Writes one table, its buffers 0..count-1 in order, to a file of its own.
+// The table key is on the key list.  False on any failure.
+bool DumpTable(KEL_ParamList *keys, int32_t table, uint32_t count, uint8_t *record,
+               SignatureCounter *counter) {
+   FileCloser file;
+   for (uint32_t j = 0; j < count; j++) {
+      if (KEL_ParamListAddInt(keys, j) != KEL_STATUS_OK) return false;
+      KEL_Status status = KEL_Get(KEL_NODE_hardware_acpi_tables_buffers, keys, record, kRecordSize);
+      KEL_ParamListRemoveLastParam(keys);
+      if (status != KEL_STATUS_OK) return false;
+
+      uint32_t length = ReadU32(record, kLength);
+      if (length > kDataMax) {
+         std::fprintf(stderr, "amldump: table %d buffer %u claims %u bytes, more than the %u a buffer holds\n",
+                      table, j, length, kDataMax);
+         return false;
+      }
+      if (j == 0 && !OpenTableFile(record, table, counter, &file)) return false;
+      if (!WriteAll(file.fd, record + kData, length)) return false;
+   }
+   return true;
+}
+
+}  // namespace
+
+int AmldumpMain(int, char **) {
+   KEL_ParamList *list = nullptr;
+   if (GetInstanceList(KEL_NODE_hardware_acpi_tables, nullptr, &list) != KEL_STATUS_OK) return 1;
+   ParamListPtr tables(list);
+   uint32_t numTables = KEL_ParamListUsedCount(tables.get());
+   if (numTables == 0) return 0;
+
+   ParamListPtr keys(KEL_ParamListCreate(1, 2));
+   if (!keys) return 1;
+
+   // One record buffer serves every read of the run.
+   static uint8_t record[kRecordSize];
+   SignatureCounter counter;
+   for (uint32_t i = 0; i < numTables; i++) {
+      int32_t table;
+      if (KEL_ParamListGetInt32(tables.get(), i, &table) != KEL_STATUS_OK) return 1;
+      // The key goes back sign-extended to 64 bits.
+      if (KEL_ParamListAddInt(keys.get(), uint64_t(int64_t(table))) != KEL_STATUS_OK) return 1;
+
+      // Only the number of buffers counts; they are read by index 0..m-1.
+      if (GetInstanceList(KEL_NODE_hardware_acpi_tables_buffers, keys.get(), &list) != KEL_STATUS_OK)
+         return 1;
+      uint32_t numBuffers = KEL_ParamListUsedCount(list);
+      KEL_ParamListDestroy(list);
+
+      if (numBuffers > 0 && !DumpTable(keys.get(), table, numBuffers, record, &counter)) return 1;
+      KEL_ParamListRemoveLastParam(keys.get());
+   }
+   return 0;
+}
