@@ -23,7 +23,8 @@ cache mode they are refused.
 === snapshot big extends boot
 {"tree": {"system": {"bootOptionFiles": {
    "big.cfg": {"content": {"pattern": "abcdef\n", "length": 6291556}},
-   "trickle.cfg": {"content": {"text": "one\ntwo\nthree\n", "chunkLimit": 4}}}}}}
+   "trickle.cfg": {"content": {"text": "one\ntwo\nthree\n", "chunkLimit": 4}},
+   "nul.cfg": {"content": {"pattern": "ab\u0000", "length": 3145730}}}}}}
 === snapshot stuck extends boot
 {"tree": {"system": {"bootOptionFiles": {
    "stuck.cfg": {"content": {"text": "never read\n", "chunkLimit": 0}}}}}}
@@ -191,6 +192,13 @@ check: ORXKEL_SIMULATOR=@CACHE @BIN/orxkeltools bootOption -r -c big.cfg > out &
 check: yes abcdef | head -c 6291556 | tr '\n' ' ' > want && echo >> want && ORXKEL_SIMULATOR=@CACHE @BIN/orxkeltools bootOption -r -c big.cfg | cmp - want
 exit: 0
 --- stdout (any)
+=== case each chunk is 3 MiB and prints up to its first NUL
+snapshot: big
+mode: sim
+run: bootOption -c nul.cfg
+exit: 0
+--- stdout
+Boot Option File Content nul.cfg : abab
 === case a short read goes on from where it stopped
 snapshot: big
 mode: sim
