@@ -139,7 +139,7 @@ int PrintContent(const char *name, bool raw) {
                       static_cast<unsigned long long>(offset), length);
          return 1;
       }
-      count = std::min(count, chunk);
+      count = std::min(count, chunk);  // never more than the buffer holds
       char *text = static_cast<char *>(KELData_GetData(out.get()));
       text[count] = '\0';
       std::replace(text, text + count, '\n', ' ');
