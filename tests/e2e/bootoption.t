@@ -20,6 +20,8 @@ cache mode they are refused.
       "tools.t00": {"stats": {"size": 8192, "bootModule": 2}}}}}}}
 === snapshot one-word extends boot
 {"tree": {"system": {"bootCmdLine": "b.b00", "bootMAC": {"pxe": 0}}}}
+=== snapshot full-line extends boot
+{"tree": {"system": {"bootCmdLine": "@LINE"}}}
 === snapshot big extends boot
 {"tree": {"system": {"bootOptionFiles": {
    "big.cfg": {"content": {"pattern": "abcdef\n", "length": 6291556}},
@@ -142,6 +144,13 @@ exit: 0
 --- stdout
 b.b00
 
+=== case a command line that fills its record has no NUL
+snapshot: full-line
+value: LINE python3 -c 'print("k.gz" + " o" * 2046)'
+run: bootOption -r -k -o
+check: python3 -c 'print("k.gz"); print(" ".join(["o"] * 2046))' > want && @BIN/orxkeltools -c @CACHE bootOption -r -k -o | cmp - want
+exit: 0
+--- stdout (any)
 === case contents with line feeds print on one line
 snapshot: boot
 mode: sim

@@ -13,6 +13,8 @@ update), the build number's padding, and the help paths.
 {"tree": {"system": {"version": {"releaseLevel": "Releases"}}}}
 === snapshot no-update-text extends ga
 {"tree": {"system": {"version": {"update": ""}}}}
+=== snapshot full-product extends ga
+{"tree": {"system": {"version": {"product": "OrvikHypervisorForTheDataCenter!"}}}}
 === snapshot unreadable
 {"buildDate": "Nov 30 2026",
  "tree": {"system": {"version": {"$status": "0xbad0003"}}}}
@@ -61,6 +63,12 @@ run: halvex -l
 exit: 0
 --- stdout
 Orvik 9.1.0 Update 
+=== case a product name that fills its field has no NUL
+snapshot: full-product
+run: halvex -v
+exit: 0
+--- stdout
+OrvikHypervisorForTheDataCenter! 9.1.0 build-00042
 === case the version record cannot be read
 snapshot: unreadable
 run: halvex -v -l
