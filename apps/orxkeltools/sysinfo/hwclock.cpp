@@ -3,7 +3,6 @@
 #include <getopt.h>
 
 #include <cerrno>
-#include <climits>
 #include <cstdio>
 #include <cstdlib>
 
