@@ -75,15 +75,6 @@ run: pkill -KILL crond
 check: timeout 3 sh -c 'until grep -qs "^State:.Z" /proc/@PID:a/status; do sleep 0.05; done'
 check: sleep 0.3; ! test -e b.sig
 exit: 0
-=== case -9 ends the process
-snapshot: two
-mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
-run: pkill -9 sshd
-check: timeout 3 sh -c 'until grep -qs "^State:.Z" /proc/@PID:b/status; do sleep 0.05; done'
-check: sleep 0.3; ! test -e a.sig
-exit: 0
 === case -kill is no signal: getopt reports its letters and TERM is sent
 snapshot: two
 mode: sim
@@ -267,12 +258,6 @@ snapshot: one
 spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
 run: pkill crond
 check: sleep 0.3; ! test -e a.sig
-exit: 1
---- stderr
-Using KEL cache is unsupported
-=== case cache mode is refused with no arguments too
-snapshot: unlisted
-run: pkill
 exit: 1
 --- stderr
 Using KEL cache is unsupported
