@@ -1,0 +1,52 @@
+// The cartel walk of pgrep and pkill.
+#include "worlds/cartelwalk.h"
+
+#include <cstdio>
+#include <cstring>
+
+#include "worlds/worldinfo.h"
+
+PatternResult CompilePattern(const char *command, const char *text, PatternPtr *pattern) {
+   auto *re = static_cast<regex_t *>(std::malloc(sizeof(regex_t)));
+   if (re == nullptr) return PatternResult::NoMemory;
+   int error = regcomp(re, text, REG_EXTENDED | REG_NOSUB);
+   if (error != 0) {
+      char reason[256];
+      regerror(error, re, reason, sizeof reason);
+      std::fprintf(stderr, "%s: %s\n", command, reason);
+      std::free(re);
+      return PatternResult::BadPattern;
+   }
+   pattern->reset(re);
+   return PatternResult::Compiled;
+}
+
+KEL_Status WalkCartels(const regex_t &pattern, bool full, CartelVisitor visit, void *context) {
+   ParamListPtr keys(KEL_ParamListCreate(1, 1));
+   if (!keys) return KEL_STATUS_NO_MEMORY;
+   KEL_ParamList *raw = nullptr;
+   KEL_Status status = GetInstanceList(KEL_NODE_userworld_cartel, nullptr, &raw);
+   if (status != KEL_STATUS_OK) return status;
+   ParamListPtr cartels(raw);
+
+   // One byte beyond the record keeps a command line that fills it terminated.
+   char cmdline[kCmdlineSize + 1];
+   uint32_t n = KEL_ParamListUsedCount(cartels.get());
+   for (uint32_t i = 0; i < n; i++) {
+      if (!AddParamToList(KEL_ParamListGetParam(cartels.get(), i), keys.get()))
+         return KEL_STATUS_FAILURE;
+      status = KEL_Get(KEL_NODE_userworld_cartel_cmdline, keys.get(), cmdline, kCmdlineSize);
+      KEL_ParamListRemoveLastParam(keys.get());
+      if (status == KEL_STATUS_NO_CARTEL) continue;
+      if (status != KEL_STATUS_OK) return status;
+
+      cmdline[kCmdlineSize] = '\0';
+      if (!full) {
+         if (char *space = std::strchr(cmdline, ' ')) *space = '\0';
+      }
+      CartelSeen seen{cartels.get(), i, cmdline, regexec(&pattern, cmdline, 0, nullptr, 0) == 0};
+      status = visit(seen, context);
+      if (status != KEL_STATUS_OK) return status;
+   }
+   return KEL_STATUS_OK;
+}
