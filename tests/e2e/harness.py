@@ -180,11 +180,12 @@ class Runner:
 
     def substitute(self, text, values, json_mode=False):
         if json_mode:
-            # A quoted placeholder standing alone becomes a bare number.
+            # A quoted placeholder standing alone as a value (not as a member
+            # name) becomes a bare number.
             def bare(m):
                 v = values.get(m.group(1))
                 return v if v is not None and re.fullmatch(r"-?\d+", v) else m.group(0)
-            text = re.sub(r'"(@[A-Z_]+(?::[\w.-]+)?)"', bare, text)
+            text = re.sub(r'"(@[A-Z_]+(?::[\w.-]+)?)"(?!\s*:)', bare, text)
         return re.sub(r"@[A-Z_]+(?::[\w.-]+)?", lambda m: values.get(m.group(0), m.group(0)), text)
 
     def build_cache(self, json_text, out):
