@@ -109,13 +109,14 @@ bool ReadEntryNames(const char *path, std::vector<std::string> *names) {
 
 bool IsDotOrDotDot(std::string_view name) { return name == "." || name == ".."; }
 
-void PrintSize(bool human, uint64_t bytes, const char *humanFormat, const char *bytesFormat) {
+// A size in its column: the SizeToString text in 5 columns, or the bytes in 12.
+void PrintSizeColumn(bool human, uint64_t bytes) {
    if (human) {
       char text[16];
       SizeToString(bytes, text, sizeof text);
-      std::printf(humanFormat, text);
+      std::printf("%5s", text);
    } else {
-      std::printf(bytesFormat, static_cast<unsigned long long>(bytes));
+      std::printf("%12llu", static_cast<unsigned long long>(bytes));
    }
 }
 
@@ -153,7 +154,7 @@ KEL_Status ReportUnlinked(bool human) {
       bytes += size;
       std::string_view name = ReadText(record, kInodeName, kFileNameWidth);
       std::printf("%38.*s: ", int(name.size()), name.data());
-      PrintSize(human, size, "%5s", "%12llu");
+      PrintSizeColumn(human, size);
       std::printf("\n");
    }
    if (found == 0) {
@@ -161,7 +162,13 @@ KEL_Status ReportUnlinked(bool human) {
    } else {
       std::printf("Total unlinked files: %zu\n", found);
       std::printf("Size of unlinked files: ");
-      PrintSize(human, bytes, " %s\n", " %llu\n");
+      if (human) {
+         char text[16];
+         SizeToString(bytes, text, sizeof text);
+         std::printf(" %s\n", text);
+      } else {
+         std::printf(" %llu\n", static_cast<unsigned long long>(bytes));
+      }
    }
    return status;
 }
@@ -227,7 +234,7 @@ void PrintStats(const Settings &settings, const char *path, const Bucket *table,
       char label[48];
       std::snprintf(label, sizeof label, "%s %s", kKindNames[table[i].kind & 1], table[i].name);
       std::printf("%38s: ", label);
-      PrintSize(settings.human, table[i].bytes, "%5s", "%12llu");
+      PrintSizeColumn(settings.human, table[i].bytes);
       if (showInodes) std::printf("\t\t(%5u inodes)", table[i].inodes);
       std::printf("\n");
    }

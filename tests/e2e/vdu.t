@@ -1,0 +1,250 @@
+vdu in the simulator: each case builds a tree under @TMP/root, which the
+snapshot names as the corafs root; rules charge its inodes to disks.
+
+readdir order is the file system's, so every directory that holds more
+than one counted entry is either below the printed depth with all its
+entries on one disk, or holds one counted entry only.
+
+The tree of most cases ("main"):
+  .                  ramdisk root, bit 6 (directories charge no bytes)
+  docs/              ramdisk root, bit 6
+  docs/empty         ramdisk root, size 0
+  docs/guide/        tardisk tools.t00, bit 6
+  docs/guide/readme  ramdisk logs, 5000 bytes
+  mnt/               another device: skipped with all below it
+
+=== snapshot disks
+{"buildDate": "Nov 30 2026",
+ "tree": {"system": {"corafs": {
+   "tardisks": {"base.v00": {}, "tools.t00": {}},
+   "ramdisks": {"root": {}, "logs": {}, "tmpfs": {}}}}},
+ "simulator": {"corafsRoot": "@TMP/root", "corafsRules": [
+   {"path": "docs/guide/readme", "kind": "ramdisk", "disk": "logs", "flags": 0},
+   {"path": "docs/guide", "kind": "tardisk", "disk": "tools.t00", "flags": 64},
+   {"path": "mnt", "kind": "foreign", "disk": "", "flags": 0},
+   {"path": "big", "kind": "ramdisk", "disk": "tmpfs", "flags": 0},
+   {"path": "", "kind": "ramdisk", "disk": "root", "flags": 64}]}}
+=== snapshot readme-not-charged extends disks
+{"simulator": {"corafsRules": [
+   {"path": "docs/guide/readme", "kind": "ramdisk", "disk": "logs", "flags": 64},
+   {"path": "", "kind": "ramdisk", "disk": "root", "flags": 64}]}}
+=== snapshot dirs-charged extends disks
+{"simulator": {"corafsRules": [
+   {"path": "", "kind": "tardisk", "disk": "base.v00", "flags": 0}]}}
+=== snapshot two-buckets extends disks
+{"tree": {"system": {"corafs": {
+   "tardisks": {"base.v00": {}, "tools.t00": null},
+   "ramdisks": {"root": {}, "logs": null, "tmpfs": null}}}}}
+=== snapshot no-disks extends disks
+{"tree": {"system": {"corafs": {"tardisks": {}, "ramdisks": {}}}}}
+=== snapshot disks-unreadable extends disks
+{"tree": {"system": {"corafs": {
+   "tardisks": {"$listStatus": "0xbad0001"},
+   "ramdisks": {"$listStatus": "0xbad0017"}}}}}
+=== snapshot readme-unreadable extends disks
+{"tree": {"system": {"corafs": {"inodes": {"@INO": {"stats": {"$status": "0xbad0001"}}}}}}}
+=== snapshot unlinked
+{"buildDate": "Nov 30 2026",
+ "tree": {"system": {"corafs": {
+   "tardisks": {"base.v00": {}},
+   "ramdisks": {"root": {}},
+   "inodes": {
+     "11": {"stats": {"flags": 1, "size": 4096, "tardisk": "base.v00", "name": "linked.txt"}},
+     "12": {"stats": {"unlinked": true, "size": 3221225472, "ramdisk": "root", "name": "core.vmx-1234"}},
+     "13": {"stats": {"$status": "0xbad0003"}},
+     "14": {"stats": {"linkState": -4, "size": 3221225472, "ramdisk": "root", "name": "hostd.log"}},
+     "15": {"stats": {"unlinked": true, "size": 1000, "ramdisk": "root", "name": "a-file-name-longer-than-the-thirty-eight-columns"}}}}}}}
+=== snapshot unlinked-last-unreadable extends unlinked
+{"tree": {"system": {"corafs": {"inodes": {"15": {"stats": {"$status": "0xbad0001"}}}}}}}
+=== snapshot all-linked extends unlinked
+{"tree": {"system": {"corafs": {"inodes": {"12": null, "14": null, "15": null}}}}}
+=== snapshot no-inodes extends unlinked
+{"tree": {"system": {"corafs": {"inodes": {"11": null, "12": null, "13": null, "14": null, "15": null}}}}}
+=== snapshot inodes-unreadable extends unlinked
+{"tree": {"system": {"corafs": {"inodes": {"$listStatus": "0xbad0001"}}}}}
+=== case default depth: the entries in "." and then "." itself; three disks in first-met order
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu
+=== case -i counts the empty file
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -i
+=== case -s: the start only
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -s
+=== case -d x acts as -s
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -d x
+=== case -d 2 leaves out the depth of the readme
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -d 2
+=== case -a: every depth, in post-order; the other device is skipped silently
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -a
+=== case -d -1 is the largest depth; -h sizes; the last of -a, -d, -s wins
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -s -h -d -1
+=== case a starting path that ends in a slash gets no second slash
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+run: vdu root/docs/
+=== case a regular file as the start: one line, no inode count
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root/docs
+run: vdu guide/readme
+=== case an empty file as the start: nothing without -i
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu docs/empty
+=== case an empty file as the start with -i
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -i docs/empty
+=== case flag bit 6: an inode counted, its bytes not
+snapshot: readme-not-charged
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -a docs/guide
+=== case a path on another device is not counted
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -a mnt
+=== case "/" is not the corafs root off the host: nothing counted
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+run: vdu /
+=== case a missing path is not counted
+snapshot: disks
+mode: sim
+setup: mkdir -p root
+cwd: @TMP/root
+run: vdu -a nothing-here
+=== case directories charge their own size
+snapshot: dirs-charged
+mode: sim
+setup: mkdir -p root && truncate -s 100 root/notes
+value: LINE printf 'base.v00: %12d' $(( $(stat -c %s root) + 100 ))
+cwd: @TMP/root
+run: vdu -s
+=== case sums past 4 GiB are not wrapped
+snapshot: disks
+mode: sim
+setup: mkdir -p root/big && truncate -s 3G root/big/a && truncate -s 3G root/big/b && truncate -s 4095M root/big/c
+cwd: @TMP/root
+run: vdu -s
+=== case sums past 4 GiB with -h
+snapshot: disks
+mode: sim
+setup: mkdir -p root/big && truncate -s 3G root/big/a && truncate -s 3G root/big/b && truncate -s 4095M root/big/c
+cwd: @TMP/root
+run: vdu -s -h big
+=== case more disks in a subtree than buckets: the newest is dropped
+snapshot: two-buckets
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu
+=== case an inode whose stats cannot be read is reported and not counted
+snapshot: readme-unreadable
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+value: INO printf '0x%x' $(stat -c %i root/docs/guide/readme)
+cwd: @TMP/root
+run: vdu -a
+=== case both disk lists empty: no bucket space for the start
+snapshot: no-disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -a
+=== case both disk lists unreadable: as empty
+snapshot: disks-unreadable
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu
+=== case a directory path of 4095 bytes leaves no room for the slash
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+value: START printf '.'; printf '/.%.0s' $(seq 2047)
+cwd: @TMP/root
+run: vdu -a @START
+=== case an entry name that would take the path past 4095 bytes is skipped
+snapshot: disks
+mode: sim
+setup: mkdir -p root && cd root && for i in $(seq 20); do d=$(printf 'd%.0s' $(seq 198)); mkdir $d && cd $d; done && truncate -s 10 $(printf 'n%.0s' $(seq 240)) && mkdir ok && truncate -s 20 ok/f
+value: DEEP printf '.'; for i in $(seq 20); do printf '/'; printf 'd%.0s' $(seq 198); done
+value: LONG printf 'n%.0s' $(seq 240)
+cwd: @TMP/root
+run: vdu -s
+=== case -u: unlinked files, their count and total size
+snapshot: unlinked
+mode: sim
+run: vdu -u
+=== case -u -h; the operand is ignored
+snapshot: unlinked
+mode: sim
+run: vdu -u -h /no/such/path
+=== case -u: the last inode unreadable fails the report
+snapshot: unlinked-last-unreadable
+mode: sim
+run: vdu -u
+=== case -u with no unlinked file
+snapshot: all-linked
+mode: sim
+run: vdu -u
+=== case -u with no inode at all
+snapshot: no-inodes
+mode: sim
+run: vdu -u
+=== case -u: inode list unreadable
+snapshot: inodes-unreadable
+mode: sim
+run: vdu -u
+=== case cache mode is refused
+snapshot: disks
+run: vdu -a
+=== case two operands: usage
+snapshot: disks
+mode: sim
+run: vdu a b
+=== case an unknown option: usage
+snapshot: disks
+mode: sim
+run: vdu -x
+=== case -d without its depth: usage
+snapshot: disks
+mode: sim
+run: vdu -d
