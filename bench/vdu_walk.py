@@ -17,7 +17,7 @@ import subprocess
 import tempfile
 import time
 
-DISKS = [("tardisk", "base.v00"), ("tardisk", "tools.t00"), ("ramdisk", "root"), ("ramdisk", "tmp")]
+DISKS = [("tardisk", "base.v00"), ("tardisk", "tools.t00"), ("ramdisk", "root"), ("ramdisk", "tmpfs")]
 
 
 def build_tree(root, entries):
