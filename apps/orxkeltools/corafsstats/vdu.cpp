@@ -1,4 +1,324 @@
-// vdu
-#include "keltools.h"
+// vdu: disk usage of the in-memory root file system.  Walks a directory
+// tree, charges each inode's size to the tardisk or ramdisk holding it and
+// prints the totals per disk for every entry down to a chosen depth; or
+// lists the unlinked files (-u).
+#include "corafsstats/vdu.h"
 
-int VduMain(int, char **) { return CommandNotBuilt("vdu"); }
+#include <dirent.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <memory>
+#include <new>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "keltools.h"
+#include "records.h"
+
+namespace {
+
+constexpr char kOptions[] = "ad:hsiu";
+constexpr char kUsage[] =
+   "Gather stats about corafs\n"
+   "corafsdu [filepath]\n"
+   "   -h       multiple instead of bytes\n"
+   "   -d depth reports for each element up to that depth (default 1)\n"
+   "   -a       equivalent to unlimited depth\n"
+   "   -s       equivalent to zero depth\n"
+   "   -u       display stats for unlinked files\n";
+
+constexpr uint32_t kUnlimitedDepth = 0x100000;
+
+// Inode stats record (544 bytes):
+//     4  u32   flags: bit 0 on a tardisk (else a ramdisk), bit 6 size not charged
+//    20  u32   link state, 0xFFFFFFFC when unlinked
+//    28  u32   size in bytes
+//    32  text  tardisk name (128 bytes)
+//   160  text  ramdisk name (128 bytes)
+//   288  text  file name (256 bytes)
+constexpr uint32_t kInodeStatsSize = 544;
+constexpr size_t kInodeFlags = 4;
+constexpr size_t kInodeLinkState = 20;
+constexpr size_t kInodeSize = 28;
+constexpr size_t kInodeTardisk = 32;
+constexpr size_t kInodeRamdisk = 160;
+constexpr size_t kInodeName = 288;
+constexpr size_t kDiskNameWidth = 128;
+constexpr size_t kFileNameWidth = 256;
+
+constexpr uint32_t kOnTardisk = 0x1;
+constexpr uint32_t kNotCharged = 0x40;
+constexpr uint32_t kUnlinked = 0xFFFFFFFC;
+
+constexpr uint32_t kTardisk = 0, kRamdisk = 1;
+constexpr const char *kKindNames[] = {"tardisk", "ramdisk"};
+
+// The device number the in-memory root file system reports.
+constexpr dev_t kCorafsDevice = 1;
+
+using BucketTable = std::unique_ptr<vdu::Bucket[]>;
+
+BucketTable NewTable(uint32_t count) { return BucketTable(new (std::nothrow) vdu::Bucket[count]()); }
+
+KEL_Status ReadInodeStats(uint64_t inode, uint8_t *record) {
+   ParamListPtr keys(KEL_ParamListCreate(1, 1));
+   if (!keys) return KEL_STATUS_NO_MEMORY;
+   KEL_Status status = KEL_ParamListAddInt(keys.get(), inode);
+   if (status != KEL_STATUS_OK) return status;
+   return KEL_Get(KEL_NODE_system_corafs_inodes_stats, keys.get(), record, kInodeStatsSize);
+}
+
+// Fills the entry's own bucket from its inode stats; false (after the
+// message) when they cannot be read.  *size is the record's size field.
+bool ReadOwnBucket(const char *path, uint64_t inode, vdu::Bucket *own, uint32_t *size) {
+   uint8_t record[kInodeStatsSize];
+   KEL_Status status = ReadInodeStats(inode, record);
+   if (status != KEL_STATUS_OK) {
+      std::fprintf(stderr, "KEL_Get error for '%s' (%s)\n", path, ORX_ReturnStatusToString(status));
+      return false;
+   }
+   uint32_t flags = ReadU32(record, kInodeFlags);
+   *size = ReadU32(record, kInodeSize);
+   bool tardisk = flags & kOnTardisk;
+   std::string_view disk = ReadText(record, tardisk ? kInodeTardisk : kInodeRamdisk, kDiskNameWidth);
+   size_t n = std::min(disk.size(), sizeof own->name - 1);
+   std::memcpy(own->name, disk.data(), n);
+   own->name[n] = '\0';
+   own->kind = tardisk ? kTardisk : kRamdisk;
+   own->bytes = flags & kNotCharged ? 0 : *size;
+   own->inodes = 1;
+   return true;
+}
+
+// The names of a directory's entries in readdir order; false when it cannot
+// be opened.  Reading them all first keeps one directory open at a time, so
+// deep trees do not run out of file descriptors.
+bool ReadEntryNames(const char *path, std::vector<std::string> *names) {
+   DIR *dir = opendir(path);
+   if (dir == nullptr) return false;
+   while (const dirent *e = readdir(dir)) names->emplace_back(e->d_name);
+   closedir(dir);
+   return true;
+}
+
+bool IsDotOrDotDot(std::string_view name) { return name == "." || name == ".."; }
+
+// A size in its column: the SizeToString text in 5 columns, or the bytes in 12.
+void PrintSizeColumn(bool human, uint64_t bytes) {
+   if (human) {
+      char text[16];
+      SizeToString(bytes, text, sizeof text);
+      std::printf("%5s", text);
+   } else {
+      std::printf("%12llu", static_cast<unsigned long long>(bytes));
+   }
+}
+
+// Lists the unlinked files and their total.  Returns the status of the last
+// KEL operation: a failed read of the last inode counts, earlier ones do not.
+KEL_Status ReportUnlinked(bool human) {
+   KEL_ParamList *raw = nullptr;
+   KEL_Status status = GetInstanceList(KEL_NODE_system_corafs_inodes, nullptr, &raw);
+   if (status != KEL_STATUS_OK) return status;
+   ParamListPtr inodes(raw);
+   uint32_t total = KEL_ParamListUsedCount(inodes.get());
+   if (total == 0) {
+      std::printf("No unlinked files.\n");
+      return KEL_STATUS_OK;
+   }
+   uint64_t bytes = 0;
+   size_t found = 0;
+   for (uint32_t i = 0; i < total; i++) {
+      uint64_t inode;
+      status = KEL_ParamListGetUInt64(inodes.get(), i, &inode);
+      if (status != KEL_STATUS_OK) break;
+      ParamListPtr keys(KEL_ParamListCreate(1, 1));
+      if (!keys) {
+         status = KEL_STATUS_NO_MEMORY;
+         break;
+      }
+      status = KEL_ParamListAddInt(keys.get(), inode);
+      if (status != KEL_STATUS_OK) break;
+      uint8_t record[kInodeStatsSize];
+      status = KEL_Get(KEL_NODE_system_corafs_inodes_stats, keys.get(), record, kInodeStatsSize);
+      // An inode that cannot be read is passed over.
+      if (status != KEL_STATUS_OK || ReadU32(record, kInodeLinkState) != kUnlinked) continue;
+      if (found++ == 0) std::printf("Unlinked files:\n");
+      uint32_t size = ReadU32(record, kInodeSize);
+      bytes += size;
+      std::string_view name = ReadText(record, kInodeName, kFileNameWidth);
+      std::printf("%38.*s: ", int(name.size()), name.data());
+      PrintSizeColumn(human, size);
+      std::printf("\n");
+   }
+   if (found == 0) {
+      std::printf("No unlinked files.\n");
+   } else {
+      std::printf("Total unlinked files: %zu\n", found);
+      std::printf("Size of unlinked files: ");
+      if (human) {
+         char text[16];
+         SizeToString(bytes, text, sizeof text);
+         std::printf(" %s\n", text);
+      } else {
+         std::printf(" %llu\n", static_cast<unsigned long long>(bytes));
+      }
+   }
+   return status;
+}
+
+// How many disks there are: tardisks plus ramdisks; a list that cannot be
+// read counts none.
+uint32_t CountDisks() {
+   uint32_t count = 0;
+   for (KEL_Node node : {KEL_NODE_system_corafs_tardisks, KEL_NODE_system_corafs_ramdisks}) {
+      KEL_ParamList *raw = nullptr;
+      if (GetInstanceList(node, nullptr, &raw) != KEL_STATUS_OK) continue;
+      ParamListPtr list(raw);
+      count += KEL_ParamListUsedCount(list.get());
+   }
+   return count;
+}
+
+}  // namespace
+
+namespace vdu {
+
+void MergeBucket(Bucket *table, uint32_t *used, uint32_t count, const Bucket &child) {
+   for (uint32_t i = 0; i < *used; i++) {
+      if (table[i].kind == child.kind && std::strcmp(table[i].name, child.name) == 0) {
+         table[i].bytes += child.bytes;
+         table[i].inodes += child.inodes;
+         return;
+      }
+   }
+   if (*used < count) {
+      table[(*used)++] = child;
+      return;
+   }
+   std::fprintf(stderr, "Not enough dustats buckets\n");
+}
+
+bool DirectoryPrefix(const char *path, std::string *prefix) {
+   size_t length = std::strlen(path);
+   if (length > kPathBufferSize - 1) {
+      std::fprintf(stderr, "path too long for '%s' (%d)\n", path, int(length));
+      return false;
+   }
+   prefix->reserve(kPathBufferSize);
+   if (length == 0) {
+      prefix->assign("/");
+   } else if (path[length - 1] == '/') {
+      prefix->assign(path, length);
+   } else {
+      if (length + 1 == kPathBufferSize) {
+         std::fprintf(stderr, "path too long for '%s' (%d)\n", path, int(kPathBufferSize));
+         return false;
+      }
+      prefix->assign(path, length);
+      prefix->push_back('/');
+   }
+   return true;
+}
+
+void PrintStats(const Settings &settings, const char *path, const Bucket *table, uint32_t used,
+                bool showInodes) {
+   std::printf("For '%s':\n", path);
+   for (uint32_t i = 0; i < used; i++) {
+      char label[48];
+      std::snprintf(label, sizeof label, "%s %s", kKindNames[table[i].kind & 1], table[i].name);
+      std::printf("%38s: ", label);
+      PrintSizeColumn(settings.human, table[i].bytes);
+      if (showInodes) std::printf("\t\t(%5u inodes)", table[i].inodes);
+      std::printf("\n");
+   }
+}
+
+uint32_t Walk(const Settings &settings, const char *path, uint32_t depth, Bucket *table,
+              uint32_t count) {
+   struct stat st;
+   if (OrxFs_Lstat(path, &st) != 0 || st.st_dev != kCorafsDevice) return 0;
+   Bucket own;
+   uint32_t size;
+   if (!ReadOwnBucket(path, st.st_ino, &own, &size)) return 0;
+   if (count == 0) {
+      std::fprintf(stderr, "No bucket space for '%s'\n", path);
+      return 0;
+   }
+   table[0] = own;
+
+   if (!S_ISDIR(st.st_mode)) {
+      if (size == 0 && !settings.countEmpty) return 0;
+      if (depth <= settings.maxDepth) PrintStats(settings, path, table, 1, false);
+      return 1;
+   }
+
+   std::vector<std::string> names;
+   if (!ReadEntryNames(path, &names)) return 0;
+   std::string childPath;
+   if (!DirectoryPrefix(path, &childPath)) return 0;
+   const size_t prefixLength = childPath.size();
+   uint32_t used = 1;
+   for (const std::string &name : names) {
+      if (prefixLength + name.size() + 1 > kPathBufferSize - 1) {
+         std::fprintf(stderr, "path too long for '%s' '%s' (%d)\n", path, name.c_str(),
+                      int(prefixLength + name.size()));
+         continue;
+      }
+      if (IsDotOrDotDot(name)) continue;
+      childPath.resize(prefixLength);
+      childPath += name;
+      BucketTable child = NewTable(count);
+      if (!child) {
+         std::fprintf(stderr, "unable to allocate memory for stats");
+         continue;
+      }
+      uint32_t filled = Walk(settings, childPath.c_str(), depth + 1, child.get(), count);
+      for (uint32_t i = 0; i < filled; i++) MergeBucket(table, &used, count, child[i]);
+   }
+   if (depth <= settings.maxDepth) PrintStats(settings, path, table, used, true);
+   return used;
+}
+
+}  // namespace vdu
+
+int VduMain(int argc, char **argv) {
+   if (InvokedWithCache) {
+      std::fprintf(stderr, "Using KEL cache is unsupported\n");
+      return 1;
+   }
+
+   vdu::Settings settings;
+   bool unlinked = false;
+   int opt;
+   while ((opt = getopt(argc, argv, kOptions)) != -1) {
+      switch (opt) {
+      case 'a': settings.maxDepth = kUnlimitedDepth; break;
+      case 'd': settings.maxDepth = uint32_t(std::strtol(optarg, nullptr, 10)); break;
+      case 's': settings.maxDepth = 0; break;
+      case 'h': settings.human = true; break;
+      case 'i': settings.countEmpty = true; break;
+      case 'u': unlinked = true; break;
+      default: std::fputs(kUsage, stderr); return 1;
+      }
+   }
+   if (argc - optind > 1) {
+      std::fputs(kUsage, stderr);
+      return 1;
+   }
+   const char *start = optind < argc ? argv[optind] : ".";
+
+   if (unlinked) return ReportUnlinked(settings.human) == KEL_STATUS_OK ? 0 : 1;
+
+   uint32_t count = CountDisks();
+   BucketTable table = NewTable(count);
+   if (!table) return -12;
+   vdu::Walk(settings, start, 0, table.get(), count);
+   return 0;
+}
