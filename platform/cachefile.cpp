@@ -92,8 +92,9 @@ bool DecodeKey(std::string_view bytes, size_t *pos, Key *key) {
 bool DecodeList(std::string_view bytes, std::vector<Key> *keys) {
    if (bytes.size() < 4) return false;
    uint32_t count = LoadU32(reinterpret_cast<const uint8_t *>(bytes.data()));
-   // Each key takes at least 9 bytes, so a count beyond that is damage.
-   if (count > (bytes.size() - 4) / 9) return false;
+   // Each key takes at least 5 bytes (an empty text), so a count beyond that
+   // is damage; it also bounds what is reserved below.
+   if (count > (bytes.size() - 4) / 5) return false;
    keys->clear();
    keys->reserve(count);
    size_t pos = 4;

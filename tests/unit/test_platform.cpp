@@ -182,6 +182,13 @@ TEST_F(CacheTest, ListingsKeepTheirOrder) {
    KEL_ParamListDestroy(raw);
 }
 
+TEST(CacheFormat, ListingsOfShortTextKeysDecode) {
+   std::vector<Key> keys{TextKey("a"), TextKey(""), TextKey("tmp")};
+   std::vector<Key> back;
+   ASSERT_TRUE(DecodeList(EncodeList(keys), &back));
+   EXPECT_EQ(back, keys);
+}
+
 TEST_F(CacheTest, SignatureAndBuildDate) {
    char date[21];
    const char *mine = nullptr;
