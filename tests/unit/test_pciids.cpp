@@ -7,6 +7,7 @@
 #include <filesystem>
 #include <fstream>
 #include <string>
+#include <thread>
 
 #include "pci/pciids.h"
 
@@ -254,6 +255,35 @@ TEST_F(PciIds, LongLinesArriveInPieces) {
    EXPECT_EQ(PciDevCount(), 3);
    EXPECT_EQ(Names(0x1af4, 0x0001), "Red Hat, Inc.|" + std::string(127 - 0, 'n'));
    EXPECT_EQ(Names(0x1af4, 0x0002), "Red Hat, Inc.|Second piece");
+}
+
+TEST_F(PciIds, LongLinesAcrossReadChunks) {
+   // 1000 lines of 301 bytes: a device line cut after 255 bytes, and its
+   // continuation, a comment.  The file spans several read chunks, so lines
+   // and pieces straddle their seams.
+   std::string ids = "1af4  Red Hat, Inc.\n";
+   for (int i = 0; i < 1000; i++) {
+      char id[8];
+      std::snprintf(id, sizeof id, "%04x", i);
+      ids += "\t" + std::string(id) + "  " + std::string(248, char('a' + i % 26)) + "#" +
+             std::string(44, 'c') + "\n";
+   }
+   Write("pci.ids", ids + kClasses);
+   ASSERT_EQ(Load(), "");
+   EXPECT_EQ(PciDevCount(), 1001);
+   for (int i : {0, 217, 218, 435, 999})
+      EXPECT_EQ(Names(0x1af4, uint16_t(i)), "Red Hat, Inc.|" + std::string(127, char('a' + i % 26))) << i;
+}
+
+TEST_F(PciIds, AFileThatCannotBeMappedIsReadIntoMemory) {
+   std::string path = root_ + "/pci.ids";
+   ASSERT_EQ(mkfifo(path.c_str(), 0600), 0);
+   std::thread writer([&] { std::ofstream(path) << "1af4  Red Hat, Inc.\n\t1041  Virtio network\n" + kClasses; });
+   std::string err = Load();
+   writer.join();
+   EXPECT_EQ(err, "");
+   EXPECT_EQ(Names(0x1af4, 0x1041), "Red Hat, Inc.|Virtio network");
+   EXPECT_EQ(ClassNames(0x0200), "Network controller|Ethernet controller");
 }
 
 TEST_F(PciIds, NamesAreCut) {

@@ -57,15 +57,17 @@ constexpr int kFunctionLevel = 4;
 
 // Module record (KEL_NODE_system_modules_general, 700 bytes): the name at 0
 // (only its first 32 bytes are used) and the module ID, u32, at 288.
-constexpr uint32_t kModuleRecordSize = 700;
-constexpr size_t kModuleName = 0;
-constexpr size_t kModuleNameWidth = 32;
-constexpr size_t kModuleId = 288;
+namespace modulerecord {
+constexpr uint32_t kSize = 700;
+constexpr size_t kName = 0;
+constexpr size_t kNameWidth = 32;
+constexpr size_t kId = 288;
+}  // namespace modulerecord
 constexpr uint32_t kNoModule = 0xffffffff;
 
 struct ModuleEntry {
    uint32_t id;
-   char name[kModuleNameWidth + 1];
+   char name[modulerecord::kNameWidth + 1];
 };
 
 // The module table: one entry per kernel module, closed by an entry with
@@ -105,15 +107,15 @@ ModuleEntry *ListModules() {
          std::free(table);
          return nullptr;
       }
-      uint8_t rec[kModuleRecordSize];
+      uint8_t rec[modulerecord::kSize];
       status = KEL_Get(KEL_NODE_system_modules_general, keys.get(), rec, sizeof rec);
       if (status != KEL_STATUS_OK) {
          std::fprintf(stderr, "ListModules: error fetching module info - 0x%x\n", status);
          std::free(table);
          return nullptr;
       }
-      table[i].id = ReadU32(rec, kModuleId);
-      std::string_view name = ReadText(rec, kModuleName, kModuleNameWidth);
+      table[i].id = ReadU32(rec, modulerecord::kId);
+      std::string_view name = ReadText(rec, modulerecord::kName, modulerecord::kNameWidth);
       std::memcpy(table[i].name, name.data(), name.size());
       KEL_ParamListRemoveLastParam(keys.get());
    }
@@ -139,6 +141,23 @@ void HexDump(const uint8_t *bytes, size_t length) {
    }
 }
 
+// The fields of a PCI function record that lspci shows.
+struct PciFunction {
+   uint16_t vendor, device, subvendor, subdevice, classCode;
+   uint8_t isaIrq, irq, vector, intPin, spawnedBus, irqFlags, modeFlags;
+   uint32_t moduleId;
+   std::string_view kernelName;  // points into the record
+};
+
+PciFunction DecodeFunction(const uint8_t *rec) {
+   using namespace pcirecord;
+   return PciFunction{ReadU16(rec, kVendor),    ReadU16(rec, kDevice),     ReadU16(rec, kSubvendor),
+                      ReadU16(rec, kSubdevice), ReadU16(rec, kClassCode),  ReadU8(rec, kIsaIrq),
+                      ReadU8(rec, kIrq),        ReadU8(rec, kVector),      ReadU8(rec, kIntPin),
+                      ReadU8(rec, kSpawnedBus), ReadU8(rec, kIrqFlags),    ReadU8(rec, kModeFlags),
+                      ReadU32(rec, kModuleId),  ReadText(rec, kDeviceName, kDeviceNameWidth)};
+}
+
 struct Walk {
    unsigned flags;
    KEL_ParamList *keys;  // segment, bus, slot, function of the current function
@@ -157,97 +176,85 @@ void PrintAddress(const Walk &w) {
    std::printf("%04x:%02x:%02x.%x ", KeyAt(w.keys, 0), KeyAt(w.keys, 1), KeyAt(w.keys, 2), KeyAt(w.keys, 3));
 }
 
-void PrintDefault(const Walk &w) {
-   using namespace pcirecord;
-   uint16_t vendor = ReadU16(w.rec, kVendor);
-   uint16_t device = ReadU16(w.rec, kDevice);
-   uint16_t classCode = ReadU16(w.rec, kClassCode);
-   PrintAddress(w);
-   if (w.flags & kNoLookup) {
-      std::printf("Class %.4x: %04x:%04x ", classCode, vendor, device);
+// Class, vendor and device names, with numeric stand-ins for what the ID
+// database does not know.
+void PrintNames(const PciFunction &f, bool verbose) {
+   char unknownClass[64];
+   std::string_view className, subclassName;
+   if (const PciClassEntry *cls = LookupPciClass(f.classCode)) {
+      className = PciName(cls->className);
+      subclassName = PciName(cls->subclassName);
    } else {
-      char unknownClass[64];
-      std::string_view className, subclassName;
-      if (const PciClassEntry *cls = LookupPciClass(classCode)) {
-         className = PciName(cls->className);
-         subclassName = PciName(cls->subclassName);
-      } else {
-         std::snprintf(unknownClass, sizeof unknownClass, "Unknown class %.4x", classCode);
-         className = unknownClass;
-      }
-
-      char vendorBuf[64], deviceBuf[128];
-      std::string_view vendorName, deviceName;
-      if (const PciDevEntry *dev = LookupPciDevice(vendor, device, ReadU16(w.rec, kSubvendor),
-                                                   ReadU16(w.rec, kSubdevice))) {
-         vendorName = PciName(dev->vendorName);
-         deviceName = PciName(dev->name);
-      } else {
-         if (const PciDevEntry *row = LookupPciDevice(vendor, 0xffff, 0xffff, 0xffff)) {
-            vendorName = PciName(row->vendorName);
-         } else {
-            std::snprintf(vendorBuf, sizeof vendorBuf, "Vendor %.4x", vendor);
-            vendorName = vendorBuf;
-         }
-         std::snprintf(deviceBuf, sizeof deviceBuf, "Device %.4x", device);
-         deviceName = deviceBuf;
-      }
-
-      if (w.flags & kVerbose) {
-         std::printf("%.*s %.*s: ", int(className.size()), className.data(), int(subclassName.size()),
-                     subclassName.data());
-      } else {
-         std::string_view shown = subclassName.empty() ? className : subclassName;
-         std::printf("%.*s: ", int(shown.size()), shown.data());
-      }
-      std::printf("%.*s %.*s ", int(vendorName.size()), vendorName.data(), int(deviceName.size()),
-                  deviceName.data());
+      std::snprintf(unknownClass, sizeof unknownClass, "Unknown class %.4x", f.classCode);
+      className = unknownClass;
    }
 
-   std::string_view kernelName = ReadText(w.rec, kDeviceName, kDeviceNameWidth);
-   if (!kernelName.empty())
-      std::printf("[%.*s]\n", int(kernelName.size()), kernelName.data());
+   char vendorBuf[64], deviceBuf[128];
+   std::string_view vendorName, deviceName;
+   if (const PciDevEntry *dev = LookupPciDevice(f.vendor, f.device, f.subvendor, f.subdevice)) {
+      vendorName = PciName(dev->vendorName);
+      deviceName = PciName(dev->name);
+   } else {
+      if (const PciDevEntry *row = LookupPciDevice(f.vendor, 0xffff, 0xffff, 0xffff)) {
+         vendorName = PciName(row->vendorName);
+      } else {
+         std::snprintf(vendorBuf, sizeof vendorBuf, "Vendor %.4x", f.vendor);
+         vendorName = vendorBuf;
+      }
+      std::snprintf(deviceBuf, sizeof deviceBuf, "Device %.4x", f.device);
+      deviceName = deviceBuf;
+   }
+
+   if (verbose) {
+      std::printf("%.*s %.*s: ", int(className.size()), className.data(), int(subclassName.size()),
+                  subclassName.data());
+   } else {
+      std::string_view shown = subclassName.empty() ? className : subclassName;
+      std::printf("%.*s: ", int(shown.size()), shown.data());
+   }
+   std::printf("%.*s %.*s ", int(vendorName.size()), vendorName.data(), int(deviceName.size()),
+               deviceName.data());
+}
+
+void PrintDefault(const Walk &w) {
+   PciFunction f = DecodeFunction(w.rec);
+   PrintAddress(w);
+   if (w.flags & kNoLookup)
+      std::printf("Class %.4x: %04x:%04x ", f.classCode, f.vendor, f.device);
+   else
+      PrintNames(f, w.flags & kVerbose);
+   if (!f.kernelName.empty())
+      std::printf("[%.*s]\n", int(f.kernelName.size()), f.kernelName.data());
    else
       std::putchar('\n');
    if ((w.flags & kVerbose) && !(w.flags & kNoLookup))
-      std::printf("\t Class %.4x: %04x:%04x\n\n", classCode, vendor, device);
+      std::printf("\t Class %.4x: %04x:%04x\n\n", f.classCode, f.vendor, f.device);
    if (w.flags & kDump) HexDump(w.config, sizeof w.config);
    if (w.flags & kExtDump) HexDump(w.extConfig, sizeof w.extConfig);
 }
 
 void PrintDetailed(Walk &w) {
-   using namespace pcirecord;
-   uint8_t irqFlags = ReadU8(w.rec, kIrqFlags);
+   PciFunction f = DecodeFunction(w.rec);
    char interrupt[16] = "";
-   if (irqFlags & kIrqValid) {
-      int isaIrq = ReadU8(w.rec, kIsaIrq);
-      int irq = ReadU8(w.rec, kIrq);
-      int vector = ReadU8(w.rec, kVector);
-      int pin = 'A' + ReadU8(w.rec, kIntPin);
-      if (vector == 0)
-         std::snprintf(interrupt, sizeof interrupt, "%3d/   /     %c", isaIrq, pin);
-      else if (irq == 0xff)
-         std::snprintf(interrupt, sizeof interrupt, "%3d/   /0x%02x %c", isaIrq, vector, pin);
+   if (f.irqFlags & pcirecord::kIrqValid) {
+      int pin = 'A' + f.intPin;
+      if (f.vector == 0)
+         std::snprintf(interrupt, sizeof interrupt, "%3d/   /     %c", f.isaIrq, pin);
+      else if (f.irq == 0xff)
+         std::snprintf(interrupt, sizeof interrupt, "%3d/   /0x%02x %c", f.isaIrq, f.vector, pin);
       else
-         std::snprintf(interrupt, sizeof interrupt, "%3d/%3d/0x%02x %c", isaIrq, irq, vector, pin);
+         std::snprintf(interrupt, sizeof interrupt, "%3d/%3d/0x%02x %c", f.isaIrq, f.irq, f.vector, pin);
    }
+   const char *mode = (f.modeFlags & 1) ? "C" : (f.modeFlags & 2) ? "V" : (f.modeFlags & 4) ? "P" : "U";
+   const char *module = f.moduleId == 0 || f.moduleId == kNoModule ? "" : ModuleName(w.modules, f.moduleId);
 
-   uint8_t mode = ReadU8(w.rec, kModeFlags);
-   const char *letter = (mode & 1) ? "C" : (mode & 2) ? "V" : (mode & 4) ? "P" : "U";
-
-   uint32_t moduleId = ReadU32(w.rec, kModuleId);
-   const char *module = moduleId == 0 || moduleId == kNoModule ? "" : ModuleName(w.modules, moduleId);
-
-   std::string_view kernelName = ReadText(w.rec, kDeviceName, kDeviceNameWidth);
    PrintAddress(w);
-   std::printf("%04x:%04x %04x:%04x %-14s %-1s %-12s %.*s\n", ReadU16(w.rec, kVendor), ReadU16(w.rec, kDevice),
-               ReadU16(w.rec, kSubvendor), ReadU16(w.rec, kSubdevice), interrupt, letter, module,
-               int(kernelName.size()), kernelName.data());
-
+   std::printf("%04x:%04x %04x:%04x %-14s %-1s %-12s %.*s\n", f.vendor, f.device, f.subvendor, f.subdevice,
+               interrupt, mode, module, int(f.kernelName.size()), f.kernelName.data());
    // A bridge's secondary bus stands under the interrupt column.
-   if (irqFlags & kSpawnsBus) {
+   if (f.irqFlags & pcirecord::kSpawnsBus) {
       char bus[8];
-      std::snprintf(bus, sizeof bus, " %02x", ReadU8(w.rec, kSpawnedBus));
+      std::snprintf(bus, sizeof bus, " %02x", f.spawnedBus);
       std::printf("%-12s %-19s %-14s\n", "", "", bus);
    }
 }

@@ -13,11 +13,13 @@ extern "C" const char not_avail_prefix[];
 // The folder the tool reads its ID files from.
 inline constexpr char kPciIdsRoot[] = "/usr/share/hwdata";
 
-// A name in the tables' text store: where it starts and how long it is.
-// Names are cut to 63 or 127 characters, so the length fits in a byte.
+// A name of the tables: where it starts in the ID files taken end to end
+// (or in the store of synthesized names) and how long it is.  Names are cut
+// to 63 or 127 characters, so the length fits in a byte.
 struct PciText {
    uint32_t at;
    uint8_t len;
+   uint8_t flags;
 };
 
 // One row of the device table.  A vendor row has device, subvendor and
