@@ -133,11 +133,22 @@ const char *ModuleName(ModuleTable &modules, uint32_t id) {
    return "error";
 }
 
+// Sixteen bytes a line, each line led by the offset of its first byte:
+// "%02x:" for the offset, " %02x" for each byte.  A line is formatted whole
+// and written at once; the bytes are the same as byte-by-byte printing.
 void HexDump(const uint8_t *bytes, size_t length) {
-   for (size_t i = 0; i < length; i++) {
-      if (i % 16 == 0) std::printf("%02x:", unsigned(i));
-      std::printf(" %02x", bytes[i]);
-      if (i % 16 == 15) std::putchar('\n');
+   static constexpr char kHex[] = "0123456789abcdef";
+   for (size_t row = 0; row < length; row += 16) {
+      char line[16 + 16 * 3 + 2];
+      int n = std::snprintf(line, sizeof line, "%02x:", unsigned(row));
+      size_t end = length - row < 16 ? length : row + 16;
+      for (size_t i = row; i < end; i++) {
+         line[n++] = ' ';
+         line[n++] = kHex[bytes[i] >> 4];
+         line[n++] = kHex[bytes[i] & 15];
+      }
+      if (end - row == 16) line[n++] = '\n';
+      std::fwrite(line, 1, size_t(n), stdout);
    }
 }
 
