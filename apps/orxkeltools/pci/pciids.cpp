@@ -195,7 +195,9 @@ char *ReadAll(int fd, size_t *size) {
 
 // One entry of the file list.  A file is opened when the cursor first
 // reaches it and stays open until the load ends, so that the second reading
-// sees the same file.
+// sees the same file.  Names are later read from its mapping; package
+// updates replace ID files rather than rewrite them in place, so the
+// mapping keeps the bytes that were parsed.
 struct IdFile {
    char *path;
    bool opened;
