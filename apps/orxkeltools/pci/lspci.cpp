@@ -6,6 +6,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <memory>
 #include <string_view>
 
 #include "keltools.h"
@@ -70,19 +71,17 @@ struct ModuleEntry {
    char name[modulerecord::kNameWidth + 1];
 };
 
+struct FreeDeleter {
+   void operator()(void *p) const { std::free(p); }
+};
+
 // The module table: one entry per kernel module, closed by an entry with
 // ID kNoModule.  Built at the first line that needs a module name and kept
 // for the rest of the run; after a failure the next such line tries again.
-struct ModuleTable {
-   ModuleEntry *entries = nullptr;
-   ModuleTable() = default;
-   ModuleTable(const ModuleTable &) = delete;
-   ModuleTable &operator=(const ModuleTable &) = delete;
-   ~ModuleTable() { std::free(entries); }
-};
+using ModuleTable = std::unique_ptr<ModuleEntry[], FreeDeleter>;
 
 // Reads every module's ID and name.  Null after a failure, which it reports.
-ModuleEntry *ListModules() {
+ModuleTable ListModules() {
    ParamListPtr keys(KEL_ParamListCreate(1, 1));
    if (!keys) {
       std::fputs("ListModules: Not enough memory\n", stderr);
@@ -96,22 +95,20 @@ ModuleEntry *ListModules() {
       return nullptr;
    }
    uint32_t count = KEL_ParamListUsedCount(list.get());
-   auto *table = static_cast<ModuleEntry *>(std::calloc(size_t(count) + 1, sizeof(ModuleEntry)));
-   if (table == nullptr) {
+   ModuleTable table(static_cast<ModuleEntry *>(std::calloc(size_t(count) + 1, sizeof(ModuleEntry))));
+   if (!table) {
       std::fputs("ListModules: Not enough memory\n", stderr);
       return nullptr;
    }
    for (uint32_t i = 0; i < count; i++) {
       if (!AddParamToList(KEL_ParamListGetParam(list.get(), i), keys.get())) {
          std::fprintf(stderr, "ListModules: error requesting module info - 0x%x\n", 0);
-         std::free(table);
          return nullptr;
       }
       uint8_t rec[modulerecord::kSize];
       status = KEL_Get(KEL_NODE_system_modules_general, keys.get(), rec, sizeof rec);
       if (status != KEL_STATUS_OK) {
          std::fprintf(stderr, "ListModules: error fetching module info - 0x%x\n", status);
-         std::free(table);
          return nullptr;
       }
       table[i].id = ReadU32(rec, modulerecord::kId);
@@ -126,9 +123,9 @@ ModuleEntry *ListModules() {
 // The name of the module with this ID, or "error" when the table cannot be
 // built or has no such module.
 const char *ModuleName(ModuleTable &modules, uint32_t id) {
-   if (modules.entries == nullptr) modules.entries = ListModules();
-   if (modules.entries == nullptr) return "error";
-   for (const ModuleEntry *e = modules.entries; e->id != kNoModule; e++)
+   if (!modules) modules = ListModules();
+   if (!modules) return "error";
+   for (const ModuleEntry *e = modules.get(); e->id != kNoModule; e++)
       if (e->id == id) return e->name;
    return "error";
 }
@@ -169,6 +166,8 @@ PciFunction DecodeFunction(const uint8_t *rec) {
                       ReadU32(rec, kModuleId),  ReadText(rec, kDeviceName, kDeviceNameWidth)};
 }
 
+// What the walk carries down the levels, with room for one function's
+// record and configuration spaces.
 struct Walk {
    unsigned flags;
    KEL_ParamList *keys;  // segment, bus, slot, function of the current function
