@@ -59,7 +59,7 @@ EOF
 # Mean wall time of one run of a command, in milliseconds.
 time_ms() {
    if command -v hyperfine >/dev/null 2>&1; then
-      hyperfine -N --style none --warmup 5 --runs "$runs" --export-json "$work/t.json" "$1" >/dev/null
+      hyperfine -N --style none --warmup 5 --runs "$runs" --export-json "$work/t.json" "$1" >/dev/null 2>&1
       python3 -c 'import json, sys; print("%.2f" % (json.load(open(sys.argv[1]))["results"][0]["mean"] * 1000))' \
          "$work/t.json"
    else
