@@ -1,4 +1,165 @@
-// pci-info
-#include "keltools.h"
+// pci-info: the IRQ, the physical slot or the raw configuration space of one
+// PCI function, for scripts: bare numbers without newlines and raw bytes.
+#include <unistd.h>
 
-int PciInfoMain(int, char **) { return CommandNotBuilt("pci-info"); }
+#include <cstdint>
+#include <cstdio>
+#include <cstdlib>
+#include <utility>
+
+#include "keltools.h"
+#include "pci/pcirecord.h"
+#include "records.h"
+
+namespace {
+
+constexpr char kOptions[] = "n:b:s:f:hiceS";
+constexpr char kUsage[] =
+   "pci-info\n"
+   "  -n <segment>      device segment (default: 0)\n"
+   "  -b <bus>          device bus\n"
+   "  -s <slot>         device slot\n"
+   "  -f <function>     device function\n"
+   "  -h                help\n"
+   "  -i                print IRQ vector\n"
+   "  -c                print PCI config space\n"
+   "  -e                print PCI extended config space\n"
+   "  -S                print physical slot\n";
+
+// Actions; they run in this order whatever the order of the options.
+constexpr unsigned kPrintIrq = 1;
+constexpr unsigned kPrintConfig = 2;
+constexpr unsigned kPrintExtConfig = 4;
+constexpr unsigned kPrintSlot = 8;
+
+struct Address {
+   int32_t seg = 0;
+   int32_t bus = -1;
+   int32_t slot = -1;
+   int32_t func = -1;
+};
+
+// A decimal number as strtol reads it on the 32-bit host: text that is no
+// number gives 0, and values beyond 32 bits stop at the limits.
+int32_t ParseNumber(const char *text) {
+   long long value = std::strtoll(text, nullptr, 10);
+   if (value > INT32_MAX) return INT32_MAX;
+   if (value < INT32_MIN) return INT32_MIN;
+   return int32_t(value);
+}
+
+// Finds the function's segment, bus, slot and function keys level by level
+// and returns them as a new key list.  Only a number that is not there is
+// reported here; the callers report the rest.
+KEL_Status GetDevice(const Address &a, ParamListPtr *device) {
+   ParamListPtr keys(KEL_ParamListCreate(1, 1));
+   if (!keys) {
+      std::fputs("Failed to allocate param list (size = 1)\n", stderr);
+      return KEL_STATUS_NO_RESOURCES;
+   }
+   const struct {
+      const KEL_Node *node;
+      const char *name;
+      int32_t wanted;
+   } levels[] = {
+      {&KEL_NODE_hardware_pci_seg, "seg", a.seg},
+      {&KEL_NODE_hardware_pci_seg_bus, "bus", a.bus},
+      {&KEL_NODE_hardware_pci_seg_bus_slot, "slot", a.slot},
+      {&KEL_NODE_hardware_pci_seg_bus_slot_func, "func", a.func},
+   };
+   bool first = true;
+   for (const auto &level : levels) {
+      KEL_ParamList *rawList = nullptr;
+      KEL_Status status = GetInstanceList(*level.node, first ? nullptr : keys.get(), &rawList);
+      ParamListPtr list(rawList);
+      if (status != KEL_STATUS_OK) return status;
+      first = false;
+      const KEL_Param *found = nullptr;
+      uint32_t count = KEL_ParamListUsedCount(list.get());
+      for (uint32_t i = 0; i < count && found == nullptr; i++) {
+         const KEL_Param *param = KEL_ParamListGetParam(list.get(), i);
+         if (param && int32_t(KEL_ParamGetInt(param)) == level.wanted) found = param;
+      }
+      if (found == nullptr) {
+         std::fprintf(stderr, "%s: invalid %s %d\n", "GetDevice", level.name, level.wanted);
+         return KEL_STATUS_BAD_PARAM;
+      }
+      if (!AddParamToList(found, keys.get())) return KEL_STATUS_FAILURE;
+   }
+   *device = std::move(keys);
+   return KEL_STATUS_OK;
+}
+
+// The pattern GetPCIInfo, PrintConfigSpace and PrintExtConfigSpace share:
+// find the function, then read one of its nodes into buf.
+bool ReadFunctionNode(const char *who, const Address &a, KEL_Node node, uint8_t *buf, uint32_t size) {
+   ParamListPtr keys;
+   if (GetDevice(a, &keys) != KEL_STATUS_OK) {
+      std::fprintf(stderr, "%s: invalid device: %d:%d.%d\n", who, a.bus, a.slot, a.func);
+      return false;
+   }
+   KEL_Status status = KEL_Get(node, keys.get(), buf, size);
+   if (status != KEL_STATUS_OK) {
+      std::fprintf(stderr, "%s: error fetching PCI information 0x%x\n", who, status);
+      return false;
+   }
+   return true;
+}
+
+bool GetPCIInfo(const Address &a, uint8_t (&rec)[pcirecord::kSize]) {
+   return ReadFunctionNode("GetPCIInfo", a, KEL_NODE_hardware_pci_seg_bus_slot_func_pciConfigHeader, rec,
+                           sizeof rec);
+}
+
+// The raw bytes go out with one write to descriptor 1, past the stdio
+// buffer: text printed before them is still buffered and comes after.
+bool PrintConfigSpace(const Address &a) {
+   uint8_t space[kPciConfigSpaceSize];
+   if (!ReadFunctionNode("PrintConfigSpace", a, KEL_NODE_hardware_pci_seg_bus_slot_func_pciConfigSpace, space,
+                         sizeof space))
+      return false;
+   return write(1, space, sizeof space) == ssize_t(sizeof space);
+}
+
+bool PrintExtConfigSpace(const Address &a) {
+   uint8_t space[kPciExtConfigSpaceSize];
+   if (!ReadFunctionNode("PrintExtConfigSpace", a, KEL_NODE_hardware_pci_seg_bus_slot_func_pciExtConfigSpace,
+                         space, sizeof space))
+      return false;
+   return write(1, space, sizeof space) == ssize_t(sizeof space);
+}
+
+}  // namespace
+
+int PciInfoMain(int argc, char **argv) {
+   Address a;
+   unsigned actions = 0;
+   int c;
+   while ((c = getopt(argc, argv, kOptions)) != -1) {
+      switch (c) {
+      case 'n': a.seg = ParseNumber(optarg); break;
+      case 'b': a.bus = ParseNumber(optarg); break;
+      case 's': a.slot = ParseNumber(optarg); break;
+      case 'f': a.func = ParseNumber(optarg); break;
+      case 'h': std::fputs(kUsage, stderr); return 0;
+      case 'i': actions |= kPrintIrq; break;
+      case 'c': actions |= kPrintConfig; break;
+      case 'e': actions |= kPrintExtConfig; break;
+      case 'S': actions |= kPrintSlot; break;
+      default: std::fputs(kUsage, stderr); return 1;
+      }
+   }
+   if (actions == 0) {
+      std::fputs(kUsage, stderr);
+      return 1;
+   }
+
+   // Once an action was asked for the status is 0: a script tells a failure
+   // by the missing output.
+   uint8_t rec[pcirecord::kSize];
+   if ((actions & kPrintIrq) && GetPCIInfo(a, rec)) std::printf("%3d", ReadU8(rec, pcirecord::kIrq));
+   if (actions & kPrintConfig) PrintConfigSpace(a);
+   if (actions & kPrintExtConfig) PrintExtConfigSpace(a);
+   if ((actions & kPrintSlot) && GetPCIInfo(a, rec)) std::printf("%3d", ReadI32(rec, pcirecord::kPhysSlot));
+   return 0;
+}

@@ -1,0 +1,48 @@
+// The PCI function record and configuration spaces, read by lspci and
+// pci-info.
+#ifndef ORXKELTOOLS_PCI_PCIRECORD_H
+#define ORXKELTOOLS_PCI_PCIRECORD_H
+
+#include <cstddef>
+#include <cstdint>
+
+// PCI function record (KEL_NODE_hardware_pci_seg_bus_slot_func_pciConfigHeader,
+// 128 bytes, packed, little-endian):
+//
+//    0 vendor       u16     12 ISA IRQ      u8     17 IRQ flags    u8
+//    2 device       u16     13 IRQ          u8     18 mode flags   u8
+//    4 subvendor    u16     14 vector       u8     19 module ID    u32
+//    6 subdevice    u16     15 pin (0 = A)  u8     23 device name  text[33]
+//    8 class code   u16     16 spawned bus  u8     56 phys. slot   u32
+//
+// IRQ 0xff and vector 0 mean none.  IRQ flags: bit 0 the interrupt fields
+// are valid, bit 1 the function spawns a bus.  Module ID 0 and 0xffffffff
+// mean none.
+namespace pcirecord {
+constexpr uint32_t kSize = 128;
+constexpr size_t kVendor = 0;
+constexpr size_t kDevice = 2;
+constexpr size_t kSubvendor = 4;
+constexpr size_t kSubdevice = 6;
+constexpr size_t kClassCode = 8;
+constexpr size_t kIsaIrq = 12;
+constexpr size_t kIrq = 13;
+constexpr size_t kVector = 14;
+constexpr size_t kIntPin = 15;
+constexpr size_t kSpawnedBus = 16;
+constexpr size_t kIrqFlags = 17;
+constexpr size_t kModeFlags = 18;
+constexpr size_t kModuleId = 19;
+constexpr size_t kDeviceName = 23;
+constexpr size_t kDeviceNameWidth = 33;
+constexpr size_t kPhysSlot = 56;
+
+constexpr uint8_t kIrqValid = 0x01;
+constexpr uint8_t kSpawnsBus = 0x02;
+}  // namespace pcirecord
+
+// Raw configuration spaces (pciConfigSpace and pciExtConfigSpace).
+constexpr uint32_t kPciConfigSpaceSize = 256;
+constexpr uint32_t kPciExtConfigSpaceSize = 4096;
+
+#endif
