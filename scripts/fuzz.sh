@@ -7,11 +7,13 @@ seconds=${1:-300}
 scripts/setup.sh
 CC=clang CXX=clang++ scripts/build.sh build-fuzz -DORXKEL_FUZZ=ON -DORXKEL_TESTS=OFF \
    -DCMAKE_CXX_FLAGS="-fsanitize=fuzzer-no-link,address,undefined"
-mkdir -p fuzz-out/cache fuzz-out/snapshot
+mkdir -p fuzz-out/cache fuzz-out/snapshot fuzz-out/pciids
 # Seeds: the example host as JSON and as a cache file, and the test snapshots.
 cp examples/host.json fuzz-out/snapshot/ 2>/dev/null || true
 cp build-fuzz/examples/host.cache fuzz-out/cache/ 2>/dev/null || true
-for t in cache snapshot; do
+head -c 60000 /usr/share/hwdata/pci.ids > fuzz-out/pciids/seed 2>/dev/null || true
+for t in cache snapshot pciids; do
    echo "fuzz_$t: $seconds s"
-   build-fuzz/bin/fuzz_$t -max_total_time="$seconds" -max_len=65536 fuzz-out/$t 2>&1 | tail -n 3
+   # The loader's own messages on standard error are expected: hide them.
+   build-fuzz/bin/fuzz_$t -max_total_time="$seconds" -max_len=65536 -close_fd_mask=2 fuzz-out/$t 2>&1 | tail -n 3
 done
