@@ -48,7 +48,7 @@ std::string EncodeLookup(Op op, KEL_Node node, std::span<const Key> keys) {
    return out;
 }
 
-std::optional<std::string> EncodeLookup(Op op, KEL_Node node, const KEL_ParamList *keys) {
+std::optional<std::string> EncodeParamLookup(Op op, KEL_Node node, const KEL_ParamList *keys) {
    std::string out = LookupPrefix(op, node);
    if (keys == nullptr) return out;
    for (const KEL_Param &p : keys->entries) {

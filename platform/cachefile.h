@@ -78,7 +78,7 @@ struct Key {
 void AppendKey(std::string &out, const Key &key);
 std::string EncodeLookup(Op op, KEL_Node node, std::span<const Key> keys);
 // The lookup key for a parameter list, or nothing when an entry cannot be encoded.
-std::optional<std::string> EncodeLookup(Op op, KEL_Node node, const KEL_ParamList *keys);
+std::optional<std::string> EncodeParamLookup(Op op, KEL_Node node, const KEL_ParamList *keys);
 // Decodes one key at *pos of bytes; false when it runs past the end.
 bool DecodeKey(std::string_view bytes, size_t *pos, Key *key);
 // Decodes a listing payload; false when malformed.

@@ -103,7 +103,7 @@ bool TreeLookup(Op op, KEL_Node node, const KEL_ParamList *keys, CacheHit *hit, 
       *status = KEL_STATUS_NO_TREE;
       return false;
    }
-   std::optional<std::string> lookup = EncodeLookup(op, node, keys);
+   std::optional<std::string> lookup = EncodeParamLookup(op, node, keys);
    if (!lookup) {
       *status = KEL_STATUS_BAD_PARAM;
       return false;

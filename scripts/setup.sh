@@ -3,7 +3,7 @@
 # Safe to run again: packages already present are left alone.
 set -eu
 packages="g++ clang libclang-rt-14-dev cmake ninja-build make python3 googletest libgtest-dev
-libbenchmark-dev nlohmann-json3-dev hwdata pciutils coreutils"
+libbenchmark-dev nlohmann-json3-dev hwdata pciutils coreutils hyperfine"
 missing=""
 for p in $packages; do
    dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q "install ok installed" || missing="$missing $p"

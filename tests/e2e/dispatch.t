@@ -109,7 +109,7 @@ Couldn't use specifed cache file @TMP/junk: Not a KEL cache file
 === case a truncated cache file
 snapshot: tiny
 mode: plain
-value: HALF sh -c 'f=@TMP/snapshot.cache; n=$(($(stat -c %s $f) - 7)); head -c $n $f > @TMP/half.cache; echo @TMP/half.cache'
+derive: HALF sh -c 'f=@TMP/snapshot.cache; n=$(($(stat -c %s $f) - 7)); head -c $n $f > @TMP/half.cache; echo @TMP/half.cache'
 run: -c @HALF halvex -v
 exit: 1
 --- stderr
@@ -117,7 +117,7 @@ Couldn't use specifed cache file @TMP/half.cache: Truncated cache file
 === case a cache file with one byte changed
 snapshot: tiny
 mode: plain
-value: BAD sh -c 'cp @TMP/snapshot.cache @TMP/bad.cache; printf "\377" | dd of=@TMP/bad.cache bs=1 seek=90 conv=notrunc 2>/dev/null; echo @TMP/bad.cache'
+derive: BAD sh -c 'cp @TMP/snapshot.cache @TMP/bad.cache; printf "\377" | dd of=@TMP/bad.cache bs=1 seek=90 conv=notrunc 2>/dev/null; echo @TMP/bad.cache'
 run: -c @BAD halvex -v
 exit: 1
 --- stderr

@@ -230,6 +230,12 @@ class Runner:
             if json_text is not None and not self_pid:
                 self.build_cache(json_text, cache)
             values["@CACHE"] = cache
+            for spec in case.all("derive"):
+                # derive: NAME shell command -> @NAME, run once the cache exists
+                name, command = spec.split(None, 1)
+                r = subprocess.run(["sh", "-c", self.substitute(command, values)], cwd=tmp,
+                                   capture_output=True, text=True)
+                values["@" + name] = r.stdout.strip()
 
             mode = case.get("mode", "cache")
             words = shlex.split(self.substitute(case.get("run", ""), values))

@@ -260,7 +260,9 @@ TEST(CacheReader, ByteFlipsAreCaughtOrHarmless) {
       for (int i = 0; i < flips; i++) bytes[rng() % bytes.size()] ^= char(1 + rng() % 255);
       CacheReader checked;
       // With the checksum, any change after the header is refused.
-      if (checked.Attach(bytes, 0) == KEL_STATUS_OK) EXPECT_EQ(bytes.substr(kHeaderSize), good.substr(kHeaderSize));
+      if (checked.Attach(bytes, 0) == KEL_STATUS_OK) {
+         EXPECT_EQ(bytes.substr(kHeaderSize), good.substr(kHeaderSize));
+      }
       // Without it, every lookup and entry stays within the bytes.
       CacheReader unchecked;
       if (unchecked.Attach(bytes, KEL_CACHE_NO_CHECKSUM) != KEL_STATUS_OK) continue;

@@ -1,0 +1,347 @@
+// Cache file bytes to snapshot JSON.
+//
+// Entries are first gathered into a tree of places mirroring the snapshot's
+// "tree"; that tree is then written out, listed instances in listing order.
+// An entry that the tree cannot give back byte for byte goes to "rawEntries".
+#include <algorithm>
+#include <map>
+#include <memory>
+#include <unordered_set>
+
+#include "content.h"
+#include "nodetree.h"
+#include "records.h"
+#include "snapshot.h"
+#include "values.h"
+
+namespace kelcache {
+
+namespace {
+
+using kelplat::Key;
+using kelplat::NodeInfo;
+using kelplat::Op;
+
+struct Entry {
+   std::string_view key;
+   uint32_t status;
+   std::string_view data;
+};
+
+// An entry's key taken apart.
+struct Lookup {
+   Op op;
+   KEL_Node node;
+   std::vector<Key> keys;
+};
+
+std::optional<Lookup> DecodeLookup(std::string_view key) {
+   if (key.size() < 3) return std::nullopt;
+   Lookup l{Op(uint8_t(key[0])), KEL_Node(uint8_t(key[1]) | uint8_t(key[2]) << 8), {}};
+   size_t pos = 3;
+   while (pos < key.size()) {
+      Key k;
+      if (!kelplat::DecodeKey(key, &pos, &k)) return std::nullopt;
+      l.keys.push_back(std::move(k));
+   }
+   return l;
+}
+
+std::string Encoded(const Key &key) {
+   std::string out;
+   kelplat::AppendKey(out, key);
+   return out;
+}
+
+// What was found at one position for one set of instance keys.
+struct Place {
+   std::map<int, std::unique_ptr<Place>> fixed;  // by child position
+   std::vector<std::pair<Key, std::unique_ptr<Place>>> instances;  // in order of appearance
+   std::map<std::string, size_t> instanceIndex;                     // by encoded key
+   const Entry *listing = nullptr;
+   std::vector<Key> listed;
+   const Entry *get = nullptr, *data = nullptr, *set = nullptr;
+};
+
+// The simulator's rules text as JSON, when the JSON builds it back exactly.
+std::optional<Json> DumpRules(std::string_view text) {
+   Json rules = Json::array();
+   if (text.empty()) return rules;
+   while (true) {
+      size_t end = text.find('\n');
+      std::string_view line = text.substr(0, end);
+      std::vector<std::string_view> f;
+      for (size_t start = 0;;) {
+         size_t tab = line.find('\t', start);
+         f.push_back(line.substr(start, tab - start));
+         if (tab == std::string_view::npos) break;
+         start = tab + 1;
+      }
+      if (f.size() != 4 || (f[1] != "tardisk" && f[1] != "ramdisk" && f[1] != "foreign") ||
+          !ValidUtf8(f[0]) || !ValidUtf8(f[2]))
+         return std::nullopt;
+      std::optional<uint64_t> flags = ParseIntText(f[3], IntType::U32);
+      if (!flags || std::to_string(*flags) != f[3]) return std::nullopt;
+      Json rule = Json::object();
+      rule["path"] = std::string(f[0]);
+      rule["kind"] = std::string(f[1]);
+      rule["disk"] = std::string(f[2]);
+      rule["flags"] = *flags;
+      rules.push_back(rule);
+      if (end == std::string_view::npos) return rules;
+      text.remove_prefix(end + 1);
+   }
+}
+
+Json MarkUnlisted(const Json &value) {
+   Json out = Json::object();
+   out["$unlisted"] = true;
+   for (auto it = value.begin(); it != value.end(); ++it) out[it.key()] = *it;
+   return out;
+}
+
+class Dumper {
+public:
+   // The snapshot, or nothing with *status set when the file is damaged.
+   std::optional<Json> Run(const kelplat::CacheReader &reader, KEL_Status *status);
+
+private:
+   bool PlaceListing(const Entry &e, const Lookup &l);
+   bool PlaceRead(const Entry &e, const Lookup &l);
+   bool PlaceSet(const Entry &e, const Lookup &l);
+   bool PlaceMeta(const Entry &e, const Lookup &l);
+   bool Representable(int pos, const std::vector<Key> &keys) const;
+   Place *Reach(int pos, const std::vector<Key> &keys, bool create);
+   Json Emit(int pos, const Place *place, bool unlisted) const;
+
+   const NodeTree &tree_ = TheNodeTree();
+   Place root_;
+   Json simulator_ = Json::object();
+};
+
+std::optional<Json> Dumper::Run(const kelplat::CacheReader &reader, KEL_Status *status) {
+   std::vector<Entry> entries(reader.EntryCount());
+   std::unordered_set<std::string_view> seen;
+   for (uint32_t i = 0; i < entries.size(); i++) {
+      kelplat::CacheHit hit;
+      if (!reader.EntryAt(i, &entries[i].key, &hit) || !seen.insert(entries[i].key).second) {
+         *status = KEL_STATUS_CACHE_CORRUPT;
+         return std::nullopt;
+      }
+      entries[i].status = hit.status;
+      entries[i].data = hit.data;
+   }
+   // In key order, as a built file has them, whatever order this file's index has.
+   std::sort(entries.begin(), entries.end(), [](const Entry &a, const Entry &b) { return a.key < b.key; });
+
+   // Listings first, so that reads know which instances are listed; sets
+   // last, as they join the read of the same record.
+   std::vector<std::optional<Lookup>> lookups;
+   for (const Entry &e : entries) lookups.push_back(DecodeLookup(e.key));
+   std::vector<bool> placed(entries.size());
+   for (int phase = 0; phase < 3; phase++) {
+      for (size_t i = 0; i < entries.size(); i++) {
+         if (!lookups[i] || placed[i]) continue;
+         const Entry &e = entries[i];
+         const Lookup &l = *lookups[i];
+         switch (l.op) {
+         case Op::List: placed[i] = phase == 0 && PlaceListing(e, l); break;
+         case Op::Meta: placed[i] = phase == 0 && PlaceMeta(e, l); break;
+         case Op::Get:
+         case Op::Data: placed[i] = phase == 1 && PlaceRead(e, l); break;
+         case Op::Set: placed[i] = phase == 2 && PlaceSet(e, l); break;
+         default: break;  // an unknown operation stays raw
+         }
+      }
+   }
+
+   Json doc = Json::object();
+   std::string date = reader.BuildDate();
+   if (!ValidUtf8(date))
+      for (char &c : date)
+         if (uint8_t(c) >= 0x80) c = '?';
+   doc["buildDate"] = date;
+   doc["signature"] = ToHex({reinterpret_cast<const char *>(reader.Signature().data()), 16});
+   if (!simulator_.empty()) doc["simulator"] = simulator_;
+   doc["tree"] = Emit(0, &root_, false);
+   Json raw = Json::array();
+   for (size_t i = 0; i < entries.size(); i++) {
+      if (placed[i]) continue;
+      Json r = Json::object();
+      r["key"] = ToHex(entries[i].key);
+      if (entries[i].status != KEL_STATUS_OK) r["status"] = FormatStatus(entries[i].status);
+      if (!entries[i].data.empty()) r["data"] = ToHex(entries[i].data);
+      raw.push_back(r);
+   }
+   if (!raw.empty()) doc["rawEntries"] = raw;
+   return doc;
+}
+
+bool Dumper::PlaceListing(const Entry &e, const Lookup &l) {
+   const NodeInfo *node = kelplat::FindNode(l.node);
+   if (node == nullptr || !kelplat::EndsWithLevel(node->path) ||
+       l.keys.size() + 1 != kelplat::LevelCount(node->path))
+      return false;
+   std::vector<Key> listed;
+   if (!kelplat::DecodeList(e.data, &listed)) return false;
+   int pos = tree_.nodePosition[l.node];
+   std::unordered_set<std::string> unique;
+   for (const Key &k : listed)
+      if (!KeyName(k, tree_.at(pos).levelKind) || !unique.insert(Encoded(k)).second) return false;
+   int levelObject = tree_.at(pos).parent;
+   if (!Representable(levelObject, l.keys)) return false;
+   Place *place = Reach(levelObject, l.keys, true);
+   place->listing = &e;
+   place->listed = std::move(listed);
+   return true;
+}
+
+bool Dumper::PlaceRead(const Entry &e, const Lookup &l) {
+   const NodeInfo *node = kelplat::FindNode(l.node);
+   if (node == nullptr || l.keys.size() != kelplat::LevelCount(node->path)) return false;
+   int pos = tree_.nodePosition[l.node];
+   if (l.op == Op::Data) {
+      if (!(node->flags & kelplat::KEL_NF_DATA) || !DumpData(e.status, e.data, true)) return false;
+   } else {
+      if (node->recordSize == 0 || (node->flags & kelplat::KEL_NF_DATA)) return false;
+      if (!DumpRecord(*node, {e.status, std::string(e.data), {}}, true)) return false;
+   }
+   if (!Representable(pos, l.keys)) return false;
+   Place *place = Reach(pos, l.keys, true);
+   (l.op == Op::Data ? place->data : place->get) = &e;
+   return true;
+}
+
+// A set answer rides on the read of the same record.
+bool Dumper::PlaceSet(const Entry &e, const Lookup &l) {
+   const NodeInfo *node = kelplat::FindNode(l.node);
+   if (node == nullptr || !(node->flags & kelplat::KEL_NF_SET) || !e.data.empty() ||
+       l.keys.size() != kelplat::LevelCount(node->path) || !Representable(tree_.nodePosition[l.node], l.keys))
+      return false;
+   Place *place = Reach(tree_.nodePosition[l.node], l.keys, false);
+   if (place == nullptr || place->get == nullptr) return false;
+   place->set = &e;
+   return true;
+}
+
+bool Dumper::PlaceMeta(const Entry &e, const Lookup &l) {
+   if (l.node != 0 || l.keys.size() != 1 || l.keys[0].kind != KEL_PARAM_STRING || e.status != KEL_STATUS_OK)
+      return false;
+   const std::string &name = l.keys[0].text;
+   if (name == "corafs.root" && ValidUtf8(e.data)) {
+      simulator_["corafsRoot"] = std::string(e.data);
+      return true;
+   }
+   if (name == "corafs.rules") {
+      if (std::optional<Json> rules = DumpRules(e.data)) {
+         simulator_["corafsRules"] = *rules;
+         return true;
+      }
+   }
+   return false;
+}
+
+// Whether every instance key on the way to pos has a member name.
+bool Dumper::Representable(int pos, const std::vector<Key> &keys) const {
+   size_t k = 0;
+   for (int c : tree_.Chain(pos))
+      if (tree_.at(c).levelKind >= 0 && !KeyName(keys[k++], tree_.at(c).levelKind)) return false;
+   return true;
+}
+
+Place *Dumper::Reach(int pos, const std::vector<Key> &keys, bool create) {
+   Place *place = &root_;
+   size_t k = 0;
+   for (int c : tree_.Chain(pos)) {
+      if (tree_.at(c).levelKind < 0) {
+         auto it = place->fixed.find(c);
+         if (it == place->fixed.end()) {
+            if (!create) return nullptr;
+            it = place->fixed.emplace(c, std::make_unique<Place>()).first;
+         }
+         place = it->second.get();
+         continue;
+      }
+      const Key &key = keys[k++];
+      auto it = place->instanceIndex.find(Encoded(key));
+      if (it == place->instanceIndex.end()) {
+         if (!create) return nullptr;
+         it = place->instanceIndex.emplace(Encoded(key), place->instances.size()).first;
+         place->instances.emplace_back(key, std::make_unique<Place>());
+      }
+      place = place->instances[it->second].second.get();
+   }
+   return place;
+}
+
+// The JSON at a position; place is null for a listed instance with nothing
+// stored below it.
+Json Dumper::Emit(int pos, const Place *place, bool unlisted) const {
+   const Position &at = tree_.at(pos);
+   if (at.node != nullptr && (at.node->flags & kelplat::KEL_NF_DATA)) {
+      if (place == nullptr || place->data == nullptr) return nullptr;
+      Json j = DumpData(place->data->status, place->data->data, unlisted).value_or(nullptr);
+      return unlisted ? MarkUnlisted(j) : j;
+   }
+   if (at.node != nullptr && at.node->recordSize > 0) {
+      if (place == nullptr || place->get == nullptr) return nullptr;
+      RecordEntry r{place->get->status, std::string(place->get->data), {}};
+      if (place->set != nullptr) r.setStatus = place->set->status;
+      Json j = DumpRecord(*at.node, r, unlisted).value_or(nullptr);
+      return unlisted ? MarkUnlisted(j) : j;
+   }
+   Json out = Json::object();
+   if (unlisted) out["$unlisted"] = true;
+   if (place == nullptr) return out;
+   int level = tree_.LevelChild(pos);
+   if (level < 0) {
+      for (int c : at.children)
+         if (auto it = place->fixed.find(c); it != place->fixed.end())
+            out[std::string(tree_.at(c).name)] = Emit(c, it->second.get(), false);
+      return out;
+   }
+   int kind = tree_.at(level).levelKind;
+   if (place->listing != nullptr && place->listing->status != KEL_STATUS_OK)
+      out["$listStatus"] = FormatStatus(place->listing->status);
+   if (place->listing == nullptr && tree_.at(level).node != nullptr) out["$noListing"] = true;
+   std::unordered_set<std::string> done;
+   for (const Key &k : place->listed) {
+      auto it = place->instanceIndex.find(Encoded(k));
+      const Place *child = it == place->instanceIndex.end() ? nullptr : place->instances[it->second].second.get();
+      out[*KeyName(k, kind)] = Emit(level, child, false);
+      done.insert(Encoded(k));
+   }
+   for (const auto &[k, child] : place->instances)
+      if (!done.contains(Encoded(k))) out[*KeyName(k, kind)] = Emit(level, child.get(), place->listing != nullptr);
+   return out;
+}
+
+}  // namespace
+
+}  // namespace kelcache
+
+bool DumpCache(std::string_view cacheBytes, std::string *jsonText, std::string *error) {
+   using namespace kelcache;
+   std::string message;
+   try {
+      KEL_Status status = KEL_STATUS_OK;
+      if (!TheNodeTree().error.empty()) {
+         message = "node table: " + TheNodeTree().error;
+      } else if (kelplat::CacheReader reader; (status = reader.Attach(cacheBytes, 0)) != KEL_STATUS_OK) {
+         message = ORX_ReturnStatusToString(status);
+      } else if (std::optional<Json> doc = Dumper().Run(reader, &status); !doc) {
+         message = ORX_ReturnStatusToString(status);
+      } else {
+         if (jsonText != nullptr) *jsonText = doc->dump(2) + "\n";
+         return true;
+      }
+   } catch (const Json::exception &e) {
+      message = e.what();
+   } catch (const std::bad_alloc &) {
+      message = "out of memory";
+   } catch (const std::exception &e) {
+      message = std::string("internal error: ") + e.what();
+   }
+   if (error != nullptr) *error = message;
+   return false;
+}
