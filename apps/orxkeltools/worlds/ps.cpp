@@ -22,7 +22,7 @@
 
 namespace {
 
-// Option bits, in the order of the option table below.
+// Option bits; WorldList and the printing test them.
 constexpr uint32_t kOptGid = 0x1;
 constexpr uint32_t kOptPcid = 0x2;
 constexpr uint32_t kOptType = 0x4;
@@ -54,12 +54,25 @@ struct OptionBits {
    uint32_t bits;
 };
 
-// The tree layout brings the userworld filter and the zombies with it.
+// The bits each option sets, in usage order.  The tree layout brings the
+// userworld filter and the zombies with it.
 constexpr OptionBits kOptionBits[] = {
-   {'C', kOptCartels},    {'P', kOptPcid},  {'T', kOptTime},     {'c', kOptCommand},
-   {'g', kOptSession},    {'i', kOptSummary}, {'j', kOptGid},    {'n', kOptChildren},
-   {'N', kOptThreads},    {'s', kOptState}, {'t', kOptType},     {'u', kOptUserworlds},
-   {'U', kOptUserspace},  {'v', kOptVerbose}, {'Z', kOptSecurity}, {'z', kOptZombies},
+   {'C', kOptCartels},
+   {'P', kOptPcid},
+   {'T', kOptTime},
+   {'c', kOptCommand},
+   {'g', kOptSession},
+   {'i', kOptSummary},
+   {'j', kOptGid},
+   {'n', kOptChildren},
+   {'N', kOptThreads},
+   {'s', kOptState},
+   {'t', kOptType},
+   {'u', kOptUserworlds},
+   {'U', kOptUserspace},
+   {'v', kOptVerbose},
+   {'Z', kOptSecurity},
+   {'z', kOptZombies},
    {'J', kOptTree | kOptUserworlds | kOptZombies},
 };
 
@@ -237,7 +250,7 @@ bool ReserveZombies(Gathering &g, uint32_t count) {
    uint32_t used = uint32_t(g.zombiesFound);
    if (count <= g.zombieRoom - used) return true;
    size_t want = std::max<size_t>(size_t(used) + count, 2 * size_t(g.zombieRoom));
-   if (want > UINT32_MAX / 2) return false;
+   if (want > UINT32_MAX || want > SIZE_MAX / sizeof(WorldNode)) return false;
    void *grown = std::realloc(g.zombies.get(), want * sizeof(WorldNode));
    if (grown == nullptr) return false;
    (void)g.zombies.release();
@@ -406,7 +419,7 @@ struct ParentEntry {
 bool LinkTree(Gathering &g) {
    WorldNode *nodes = g.allNodes.get();
    MallocPtr<ParentEntry> parents(
-      static_cast<ParentEntry *>(std::malloc(std::max<size_t>(g.allCount, 1) * sizeof(ParentEntry))));
+      static_cast<ParentEntry *>(std::calloc(std::max<size_t>(g.allCount, 1), sizeof(ParentEntry))));
    if (!parents) return OutOfMemory();
    uint32_t candidates = 0;
    for (uint32_t i = 0; i < g.allCount; i++)
@@ -696,7 +709,7 @@ bool WorldList(uint32_t options, uint32_t requestedUserspace) {
 
    uint32_t count = KEL_ParamListUsedCount(worlds.get());
    if (count > 0) {
-      g.gathered.reset(static_cast<WorldNode *>(std::malloc(size_t(count) * sizeof(WorldNode))));
+      g.gathered.reset(static_cast<WorldNode *>(std::calloc(count, sizeof(WorldNode))));
       if (!g.gathered) {
          std::fputs("WorldList: malloc failed when allocating root tree node\n", stderr);
          return false;
