@@ -281,22 +281,22 @@ exit: 0
 1
 \x0em\x0f\x0eq\x0f1001  1001  initd           WAIT    CHILD   0-3      38.337877  /sbin/initd
   \x0et\x0f\x0eq\x0f1002  1002  hostd           RUN     NONE    0-3      12.612811  /usr/sbin/hostd -c /etc/hostd/config.xml
+  \x0ex\x0f \x0et\x0f\x0eq\x0f1010  1002  hostd-worker    WAIT    TIMER   0-3      33.318812  /usr/sbin/hostd -c /etc/hostd/config.xml
+  \x0ex\x0f \x0et\x0f\x0eq\x0f1011  1002  hostd-worker    RUN     NONE    0-3      35.688141  /usr/sbin/hostd -c /etc/hostd/config.xml
+  \x0ex\x0f \x0em\x0f\x0eq\x0f1012  1002  hostd-io        SLEEP   TIMER   0-3      52.163940  /usr/sbin/hostd -c /etc/hostd/config.xml
   \x0et\x0f\x0eq\x0f1003  1003  agentd          WAIT    CHILD   0-3       6.543455  /usr/lib/agentd/agentd -d
+  \x0ex\x0f \x0em\x0f\x0eq\x0f1013  1003  agentd-poll                       /usr/lib/agentd/agentd -d
   \x0et\x0f\x0eq\x0f1004  1004  sh              WAIT    CHILD   0-3      47.793944  /bin/sh /opt/scripts/collect.sh
   \x0ex\x0f \x0et\x0f\x0eq\x0f1009  1009  <zombie>                        
   \x0ex\x0f \x0em\x0f\x0eq\x0f1007  1007  python3         WAIT    EVENT   0-3      41.546030  /usr/bin/python3 /opt/scripts/parse.py --interval 30
   \x0ex\x0f   \x0em\x0f\x0eq\x0f1015  1015  cat             WAIT    SIGNAL  0-3      30.417688  /bin/cat /var/log/kernel.log
-  \x0et\x0f\x0eq\x0f1006  1006  bash            WAIT    CHILD   0-3      37.879115  /bin/bash /etc/init.d/watchdog.sh
-  \x0ex\x0f \x0em\x0f\x0eq\x0f1014  1014  sleep           WAIT    TIMER   0-3      31.251012  /bin/sleep 60
-  \x0et\x0f\x0eq\x0f1010  1002  hostd-worker    WAIT    TIMER   0-3      33.318812  /usr/sbin/hostd -c /etc/hostd/config.xml
-  \x0et\x0f\x0eq\x0f1011  1002  hostd-worker    RUN     NONE    0-3      35.688141  /usr/sbin/hostd -c /etc/hostd/config.xml
-  \x0et\x0f\x0eq\x0f1012  1002  hostd-io        SLEEP   TIMER   0-3      52.163940  /usr/sbin/hostd -c /etc/hostd/config.xml
-  \x0em\x0f\x0eq\x0f1013  1003  agentd-poll                       /usr/lib/agentd/agentd -d
+  \x0em\x0f\x0eq\x0f1006  1006  bash            WAIT    CHILD   0-3      37.879115  /bin/bash /etc/init.d/watchdog.sh
+    \x0em\x0f\x0eq\x0f1014  1014  sleep           WAIT    TIMER   0-3      31.251012  /bin/sleep 60
 
   WID   CID   WorldName       State   Wait    CPU   Time          Command
 2
 \x0em\x0f\x0eq\x0f2001  2001  initd           WAIT    CHILD   0-3      20.122022  /sbin/initd
   \x0et\x0f\x0eq\x0f2002  2002  syslogd         WAIT    TIMER   0-3      53.314904  /usr/sbin/syslogd -n
-  \x0et\x0f\x0eq\x0f2003  2003  ntpd            WAIT    TIMER   0-3      46.913722  /usr/sbin/ntpd -g -n -c /etc/ntp.conf
-  \x0em\x0f\x0eq\x0f2004  2002  syslogd-writer  WAIT    IO      0-3      16.386039  /usr/sbin/syslogd -n
+  \x0ex\x0f \x0em\x0f\x0eq\x0f2004  2002  syslogd-writer  WAIT    IO      0-3      16.386039  /usr/sbin/syslogd -n
+  \x0em\x0f\x0eq\x0f2003  2003  ntpd            WAIT    TIMER   0-3      46.913722  /usr/sbin/ntpd -g -n -c /etc/ntp.conf
 
