@@ -201,8 +201,8 @@ class Runner:
                   "@SRC": os.path.abspath(os.path.join(os.path.dirname(__file__), "..", ".."))}
         spawned = []
         try:
-            for spec in case.all("spawn"):
-                name, command = spec.split(None, 1)
+            for entry in case.all("spawn"):
+                name, command = entry.split(None, 1)
                 p = subprocess.Popen(["sh", "-c", self.substitute(command, values)], cwd=tmp,
                                      stdin=subprocess.DEVNULL, stdout=subprocess.DEVNULL,
                                      start_new_session=True)
@@ -215,9 +215,9 @@ class Runner:
                                    capture_output=True, text=True)
                 if r.returncode != 0:
                     raise RuntimeError("setup failed: %s\n%s" % (command, r.stderr))
-            for spec in case.all("value"):
+            for entry in case.all("value"):
                 # value: NAME shell command -> @NAME holds its output
-                name, command = spec.split(None, 1)
+                name, command = entry.split(None, 1)
                 r = subprocess.run(["sh", "-c", self.substitute(command, values)], cwd=tmp,
                                    capture_output=True, text=True)
                 values["@" + name] = r.stdout.strip()
@@ -231,9 +231,9 @@ class Runner:
             if json_text is not None and not self_pid:
                 self.build_cache(json_text, cache)
             values["@CACHE"] = cache
-            for spec in case.all("derive"):
+            for entry in case.all("derive"):
                 # derive: NAME shell command -> @NAME, run once the cache exists
-                name, command = spec.split(None, 1)
+                name, command = entry.split(None, 1)
                 r = subprocess.run(["sh", "-c", self.substitute(command, values)], cwd=tmp,
                                    capture_output=True, text=True)
                 values["@" + name] = r.stdout.strip()
@@ -250,8 +250,8 @@ class Runner:
             env.setdefault("TZ", "UTC")
             if mode == "sim":
                 env["ORXKEL_SIMULATOR"] = cache
-            for spec in case.all("env"):
-                k, v = self.substitute(spec, values).split("=", 1)
+            for entry in case.all("env"):
+                k, v = self.substitute(entry, values).split("=", 1)
                 env[k] = v
             exe = self.tool
             if case.get("exe"):
