@@ -10,7 +10,7 @@ and the usage line.
    "interrupts": {"cookieList": {
      "0x10": {"UsageStatus": {"deviceFlag": 1},
               "PCPU": {"0": {"count": 5}, "1": {"count": 0}, "2": {"count": 12345678901}},
-              "ORXDevices": {"vmhba0": {}, "vmnic1": {}}},
+              "ORXDevices": {"ahci-0": {}, "nic-p1": {}}},
      "0x2": {"UsageStatus": {"deviceFlag": 0},
              "PCPU": {"0": {"count": 1}, "1": {"count": 2}, "2": {"count": 3}},
              "ORXDevices": {"timer": {}}},
@@ -29,8 +29,8 @@ and the usage line.
    "interrupts": {"cookieList": {
      "0x20": {"UsageStatus": {"deviceFlag": 1},
               "PCPU": {"0": {"count": 42}},
-              "ORXDevices": {"vmhba0": {}, "vmhba1": {}, "vmnic0": {}, "vmnic1": {},
-                             "vmnic2": {}, "vmnic3": {}, "vmnic4": {}, "vmnic5": {}}},
+              "ORXDevices": {"ahci-0": {}, "ahci-1": {}, "nic-p0": {}, "nic-p1": {},
+                             "nic-p2": {}, "nic-p3": {}, "nic-p4": {}, "nic-p5": {}}},
      "0x21": {"UsageStatus": {"deviceFlag": 1},
               "PCPU": {"0": {"count": 43}},
               "ORXDevices": {"a-device-name-that-is-long-enough-to-fill-the-column-by-itself": {}}}}}}}}
@@ -57,7 +57,7 @@ run: irqinfo
 exit: 0
 --- stdout
 Cookie    PCPU  0    PCPU  1    PCPU  2 
-0x0010:         5          0 12345678901 ORX vmhba0, ORX vmnic1
+0x0010:         5          0 12345678901 ORX ahci-0, ORX nic-p1
 0x0002:         1          2          3 <ORX device>
 0x0011:         7          8          9 ORX usb0, ORX device
 0x12345:18446744073709551615          1          1 
@@ -68,7 +68,7 @@ run: irqinfo
 exit: 0
 --- stdout
 Cookie    PCPU  0    PCPU  1    PCPU  2 
-0x0010:         5          0 12345678901 ORX vmhba0, ORX vmnic1
+0x0010:         5          0 12345678901 ORX ahci-0, ORX nic-p1
 0x0002:         1          2          3 <ORX device>
 0x0011:         7          8          9 ORX usb0, ORX device
 0x12345:18446744073709551615          1          1 
@@ -78,7 +78,7 @@ run: irqinfo
 exit: 0
 --- stdout
 Cookie 
-0x0010:ORX vmhba0, ORX vmnic1
+0x0010:ORX ahci-0, ORX nic-p1
 0x0002:<ORX device>
 0x0011:ORX usb0, ORX device
 0x12345:
@@ -88,7 +88,7 @@ run: irqinfo
 exit: 0
 --- stdout
 Cookie    PCPU  0 
-0x0020:        42 ORX vmhba0, ORX vmhba1, ORX vmnic0, ORX vmnic1, ORX vmnic2, ORX
+0x0020:        42 ORX ahci-0, ORX ahci-1, ORX nic-p0, ORX nic-p1, ORX nic-p2, ORX
 0x0021:        43 ORX a-device-name-that-is-long-enough-to-fill-the-column-by-its
 === case an unreadable count leaves ten blanks and shifts the row left
 snapshot: blank-count
@@ -96,7 +96,7 @@ run: irqinfo
 exit: 0
 --- stdout
 Cookie    PCPU  0    PCPU  1    PCPU  2 
-0x0010:         5           12345678901 ORX vmhba0, ORX vmnic1
+0x0010:         5           12345678901 ORX ahci-0, ORX nic-p1
 0x0002:         1          2          3 <ORX device>
 0x0011:                   8          9 ORX usb0, ORX device
 0x12345:18446744073709551615          1          1 
@@ -144,7 +144,7 @@ run: irqinfo
 exit: 1
 --- stdout
 Cookie    PCPU  0    PCPU  1    PCPU  2 
-0x0010:         5          0 12345678901 ORX vmhba0, ORX vmnic1
+0x0010:         5          0 12345678901 ORX ahci-0, ORX nic-p1
 0x0002:         1          2          3 <ORX device>
 --- stderr
 InterruptInfo: error fetching interrupt info - 0x11
@@ -154,7 +154,7 @@ run: irqinfo
 exit: 1
 --- stdout (no newline at end)
 Cookie    PCPU  0    PCPU  1    PCPU  2 
-0x0010:         5          0 12345678901 ORX vmhba0, ORX vmnic1
+0x0010:         5          0 12345678901 ORX ahci-0, ORX nic-p1
 0x0002:         1          2          3 
 --- stderr
 InterruptInfo: error fetching interrupt device list - 0xbad0014
@@ -164,7 +164,7 @@ run: irqinfo
 exit: 1
 --- stdout
 Cookie    PCPU  0    PCPU  1    PCPU  2 
-0x0010:         5          0 12345678901 ORX vmhba0, ORX vmnic1
+0x0010:         5          0 12345678901 ORX ahci-0, ORX nic-p1
 0x0002:         1          2          3 <ORX device>
 0x0011:         7          8          9 ORX usb0, ORX device
 0x12345:18446744073709551615          1          1 
