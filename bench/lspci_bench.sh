@@ -44,7 +44,7 @@ for n in range(300):
               "isaIrq": n % 16, "irq": 0xff if n % 7 == 0 else 32 + n % 200,
               "vector": 0 if n % 11 == 0 else 0x30 + n % 0xc0, "intPin": n % 4,
               "irqFlags": 3 if cls == 0x0604 else 1, "spawnedBus": bus + 1,
-              "modeFlags": 1 << (n % 3), "moduleId": module, "deviceName": "vmhba%d" % n,
+              "modeFlags": 1 << (n % 3), "moduleId": module, "deviceName": "hba%d" % n,
               "physSlot": n}
     func = {"pciConfigHeader": header, "pciConfigSpace": {"bytes": "%04x%04x" % (v, d) + "00" * 252}}
     buses.setdefault(str(bus), {"slot": {}})["slot"][str(slot)] = {"func": {"0": func}}

@@ -14,7 +14,7 @@ fresh cartel list read for every name.
    "1007": {"name": "ash", "info": {"worldId": 1007, "cartelId": 1007}},
    "1008": {"name": "bash", "info": {"worldId": 1008, "cartelId": 1008}},
    "1009": {"name": "sh", "info": {"worldId": 1009, "cartelId": 1009}},
-   "1010": {"name": "vmkernel", "info": {"worldId": 1010, "cartelId": 0}},
+   "1010": {"name": "kernelwd", "info": {"worldId": 1010, "cartelId": 0}},
    "1011": {"name": "crond", "info": {"$status": "0xbad0062"}},
    "1012": {"name": "crond", "info": {"worldId": 1012, "cartelId": 1012}}
   },
