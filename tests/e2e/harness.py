@@ -199,7 +199,7 @@ class Runner:
     def run_case(self, case, tmp):
         values = {"@TMP": tmp, "@BIN": self.bin, "@BUILD_DATE": self.build_date,
                   "@SRC": os.path.abspath(os.path.join(os.path.dirname(__file__), "..", ".."))}
-        spawned = []
+        spawned, ready = [], []
         try:
             for entry in case.all("spawn"):
                 name, command = entry.split(None, 1)
@@ -208,8 +208,16 @@ class Runner:
                                      start_new_session=True)
                 spawned.append(p)
                 values["@PID:" + name] = str(p.pid)
-            if spawned:
-                time.sleep(0.2)  # let the spawned shells install their traps
+                if name + ".ready" in command:
+                    ready.append((name, command))
+            # A spawned command that mentions NAME.ready touches it once it is
+            # ready (its traps installed); the others get a moment to start.
+            for name, command in ready:
+                deadline = time.time() + 10
+                while not os.path.exists(os.path.join(tmp, name + ".ready")) and time.time() < deadline:
+                    time.sleep(0.01)
+            if len(ready) < len(spawned):
+                time.sleep(0.2)
             for command in case.all("setup"):
                 r = subprocess.run(["sh", "-c", self.substitute(command, values)], cwd=tmp,
                                    capture_output=True, text=True)

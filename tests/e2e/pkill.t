@@ -42,8 +42,8 @@ ID.  Each shell writes the names of the signals it catches to NAME.sig.
 === case by name: TERM to the matching cartel only
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill crond
 check: timeout 3 sh -c 'until grep -qsx TERM a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = TERM
 check: sleep 0.3; ! test -e b.sig
@@ -51,8 +51,8 @@ exit: 0
 === case -NAME names the signal
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -USR1 crond
 check: timeout 3 sh -c 'until grep -qsx USR1 a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = USR1
 check: sleep 0.3; ! test -e b.sig
@@ -60,8 +60,8 @@ exit: 0
 === case -NUMBER names the signal
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -12 crond
 check: timeout 3 sh -c 'until grep -qsx USR2 a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = USR2
 check: sleep 0.3; ! test -e b.sig
@@ -69,8 +69,8 @@ exit: 0
 === case -KILL ends the process
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -KILL crond
 check: timeout 3 sh -c 'until grep -qs "^State:.Z" /proc/@PID:a/status; do sleep 0.05; done'
 check: sleep 0.3; ! test -e b.sig
@@ -78,8 +78,8 @@ exit: 0
 === case -kill is no signal: getopt reports its letters and TERM is sent
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -kill crond
 check: timeout 3 sh -c 'until grep -qsx TERM a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = TERM
 check: sleep 0.3; ! test -e b.sig
@@ -92,8 +92,8 @@ pkill: invalid option -- 'l'
 === case -SIGKILL is no signal either
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -SIGKILL crond
 check: timeout 3 sh -c 'until grep -qsx TERM a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = TERM
 check: sleep 0.3; ! test -e b.sig
@@ -109,8 +109,8 @@ pkill: invalid option -- 'L'
 === case -0 is no signal: reported as an option, TERM is sent
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -0 crond
 check: timeout 3 sh -c 'until grep -qsx TERM a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = TERM
 check: sleep 0.3; ! test -e b.sig
@@ -120,8 +120,8 @@ pkill: invalid option -- '0'
 === case without -f only the first word is searched
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill 'crond -f'
 check: sleep 0.3; ! test -e a.sig
 check: sleep 0.3; ! test -e b.sig
@@ -129,8 +129,8 @@ exit: 0
 === case -f searches the whole command line
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -HUP -f 'crond -f$'
 check: timeout 3 sh -c 'until grep -qsx HUP a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = HUP
 check: sleep 0.3; ! test -e b.sig
@@ -138,8 +138,8 @@ exit: 0
 === case several patterns, each over its own walk
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -WINCH '^/usr' '^ssh'
 check: timeout 3 sh -c 'until grep -qsx WINCH a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = WINCH
 check: timeout 3 sh -c 'until grep -qsx WINCH b.sig; do sleep 0.05; done' && test "$(cat b.sig)" = WINCH
@@ -147,8 +147,8 @@ exit: 0
 === case an unknown option is passed over
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -z -INT crond
 check: timeout 3 sh -c 'until grep -qsx TERM a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = TERM
 check: sleep 0.3; ! test -e b.sig
@@ -161,7 +161,7 @@ pkill: invalid option -- 'T'
 === case a cartel that has ended (ESRCH) is passed over
 snapshot: ended
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
 value: DEAD sh -c 'echo $$'
 run: pkill crond
 check: timeout 3 sh -c 'until grep -qsx TERM a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = TERM
@@ -169,15 +169,15 @@ exit: 0
 === case a command line that reads 0xbad0062 is passed over
 snapshot: gone-cmdline
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
 run: pkill crond
 check: timeout 3 sh -c 'until grep -qsx TERM a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = TERM
 exit: 0
 === case a refused signal: two lines, status 1, no later cartel or pattern
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -99 . sshd
 check: sleep 0.3; ! test -e a.sig
 check: sleep 0.3; ! test -e b.sig
@@ -188,8 +188,8 @@ pkill: Failure
 === case a signal number beyond 32 bits is refused, not cut to 9
 snapshot: two
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill -4294967305 crond
 check: kill -0 @PID:a && ! grep -qs '^State:.Z' /proc/@PID:a/status
 exit: 1
@@ -199,15 +199,15 @@ pkill: Failure
 === case pkill never signals itself
 snapshot: self
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
 run: pkill -KILL crond
 check: timeout 3 sh -c 'until grep -qs "^State:.Z" /proc/@PID:a/status; do sleep 0.05; done'
 exit: 0
 === case another command-line failure stops the walk
 snapshot: bad-cmdline
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
-spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
+spawn: b for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> b.sig" $s; done; touch b.ready; while :; do sleep 1 & wait $!; done
 run: pkill crond
 check: timeout 3 sh -c 'until grep -qsx TERM a.sig; do sleep 0.05; done' && test "$(cat a.sig)" = TERM
 check: sleep 0.3; ! test -e b.sig
@@ -224,7 +224,7 @@ pkill: Not found
 === case a pattern that does not compile
 snapshot: one
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
 run: pkill 'a(b'
 check: sleep 0.3; ! test -e a.sig
 exit: 1
@@ -242,7 +242,7 @@ pkill: No matching criteria specified
 === case a signal alone does nothing
 snapshot: one
 mode: sim
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
 run: pkill -HUP
 check: sleep 0.3; ! test -e a.sig
 exit: 0
@@ -255,7 +255,7 @@ exit: 0
 Usage: pkill [-SIGNAL] [PATTERN]
 === case cache mode is refused before anything else
 snapshot: one
-spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; while :; do sleep 1 & wait $!; done
+spawn: a for s in HUP INT USR1 USR2 TERM WINCH; do trap "echo $s >> a.sig" $s; done; touch a.ready; while :; do sleep 1 & wait $!; done
 run: pkill crond
 check: sleep 0.3; ! test -e a.sig
 exit: 1
