@@ -33,6 +33,14 @@ struct KELDataDeleter {
 };
 using KELDataPtr = std::unique_ptr<KELData, KELDataDeleter>;
 
+// GetInstanceList into an owner; the owner stays empty when the call fails.
+inline KEL_Status GetInstanceList(KEL_Node node, const KEL_ParamList *keys, ParamListPtr *list) {
+   KEL_ParamList *raw = nullptr;
+   KEL_Status status = GetInstanceList(node, keys, &raw);
+   list->reset(raw);
+   return status;
+}
+
 // The command handlers, in command table order.
 int ListPCI(int argc, char **argv);
 int PsMain(int argc, char **argv);

@@ -107,15 +107,14 @@ void PrintRamdiskRow(const char *name, const uint8_t *record, const View &view) 
 // fetched.  A disk whose stats cannot be read is reported and left out.
 bool PrintTable(Disk disk, const View &view) {
    const bool tar = disk == Disk::Tar;
-   KEL_ParamList *raw = nullptr;
+   ParamListPtr disks;
    KEL_Status status =
-      GetInstanceList(tar ? KEL_NODE_system_corafs_tardisks : KEL_NODE_system_corafs_ramdisks, nullptr, &raw);
+      GetInstanceList(tar ? KEL_NODE_system_corafs_tardisks : KEL_NODE_system_corafs_ramdisks, nullptr, &disks);
    if (status != KEL_STATUS_OK) {
       std::fprintf(stderr, "Error fetching %sdisk list (%s)\n", tar ? "tar" : "ram",
                    ORX_ReturnStatusToString(status));
       return false;
    }
-   ParamListPtr disks(raw);
    const KEL_Node statsNode = tar ? KEL_NODE_system_corafs_tardisks_stats : KEL_NODE_system_corafs_ramdisks_stats;
    const uint32_t recordSize = tar ? kTardiskStatsSize : kRamdiskStatsSize;
    uint32_t count = KEL_ParamListUsedCount(disks.get());

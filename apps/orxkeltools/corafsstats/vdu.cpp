@@ -123,10 +123,9 @@ void PrintSizeColumn(bool human, uint64_t bytes) {
 // Lists the unlinked files and their total.  Returns the status of the last
 // KEL operation: a failed read of the last inode counts, earlier ones do not.
 KEL_Status ReportUnlinked(bool human) {
-   KEL_ParamList *raw = nullptr;
-   KEL_Status status = GetInstanceList(KEL_NODE_system_corafs_inodes, nullptr, &raw);
+   ParamListPtr inodes;
+   KEL_Status status = GetInstanceList(KEL_NODE_system_corafs_inodes, nullptr, &inodes);
    if (status != KEL_STATUS_OK) return status;
-   ParamListPtr inodes(raw);
    uint32_t total = KEL_ParamListUsedCount(inodes.get());
    if (total == 0) {
       std::printf("No unlinked files.\n");
@@ -178,9 +177,8 @@ KEL_Status ReportUnlinked(bool human) {
 uint32_t CountDisks() {
    uint32_t count = 0;
    for (KEL_Node node : {KEL_NODE_system_corafs_tardisks, KEL_NODE_system_corafs_ramdisks}) {
-      KEL_ParamList *raw = nullptr;
-      if (GetInstanceList(node, nullptr, &raw) != KEL_STATUS_OK) continue;
-      ParamListPtr list(raw);
+      ParamListPtr list;
+      if (GetInstanceList(node, nullptr, &list) != KEL_STATUS_OK) continue;
       count += KEL_ParamListUsedCount(list.get());
    }
    return count;

@@ -161,9 +161,8 @@ bool DumpTable(KEL_ParamList *keys, int32_t table, uint32_t count, uint8_t *reco
 }  // namespace
 
 int AmldumpMain(int, char **) {
-   KEL_ParamList *list = nullptr;
-   if (GetInstanceList(KEL_NODE_hardware_acpi_tables, nullptr, &list) != KEL_STATUS_OK) return 1;
-   ParamListPtr tables(list);
+   ParamListPtr tables;
+   if (GetInstanceList(KEL_NODE_hardware_acpi_tables, nullptr, &tables) != KEL_STATUS_OK) return 1;
    uint32_t numTables = KEL_ParamListUsedCount(tables.get());
    if (numTables == 0) return 0;
 
@@ -180,10 +179,11 @@ int AmldumpMain(int, char **) {
       if (KEL_ParamListAddInt(keys.get(), uint64_t(int64_t(table))) != KEL_STATUS_OK) return 1;
 
       // Only the number of buffers counts; they are read by index 0..m-1.
-      if (GetInstanceList(KEL_NODE_hardware_acpi_tables_buffers, keys.get(), &list) != KEL_STATUS_OK)
+      ParamListPtr buffers;
+      if (GetInstanceList(KEL_NODE_hardware_acpi_tables_buffers, keys.get(), &buffers) != KEL_STATUS_OK)
          return 1;
-      uint32_t numBuffers = KEL_ParamListUsedCount(list);
-      KEL_ParamListDestroy(list);
+      uint32_t numBuffers = KEL_ParamListUsedCount(buffers.get());
+      buffers.reset();
 
       if (numBuffers > 0 && !DumpTable(keys.get(), table, numBuffers, record, &counter)) return 1;
       KEL_ParamListRemoveLastParam(keys.get());

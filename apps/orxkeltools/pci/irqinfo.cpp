@@ -96,13 +96,12 @@ bool PrintCookieRow(const KEL_Param *cookie, KEL_ParamList *keys, uint32_t numCp
    for (uint32_t cpu = 0; cpu < numCpus; cpu++)
       if (!PrintCpuCount(keys, cpu)) return false;
 
-   KEL_ParamList *list = nullptr;
-   KEL_Status status = GetInstanceList(KEL_NODE_hardware_interrupts_cookieList_ORXDevices, keys, &list);
+   ParamListPtr devices;
+   KEL_Status status = GetInstanceList(KEL_NODE_hardware_interrupts_cookieList_ORXDevices, keys, &devices);
    if (status != KEL_STATUS_OK) {
       std::fprintf(stderr, "InterruptInfo: error fetching interrupt device list - 0x%x\n", status);
       return false;
    }
-   ParamListPtr devices(list);
 
    // The device list is read even when the flag hides it.
    DevicesText text;
@@ -139,13 +138,12 @@ int InterruptInfo(int argc, char **) {
    }
    uint32_t numCpus = ReadU32(cpuInfo, kNumCpus);
 
-   KEL_ParamList *list = nullptr;
-   status = GetInstanceList(KEL_NODE_hardware_interrupts_cookieList, nullptr, &list);
+   ParamListPtr cookies;
+   status = GetInstanceList(KEL_NODE_hardware_interrupts_cookieList, nullptr, &cookies);
    if (status != KEL_STATUS_OK) {
       std::fprintf(stderr, "InterruptInfo: error fetching interrupt list - 0x%x\n", status);
       return 1;
    }
-   ParamListPtr cookies(list);
 
    std::fputs("Cookie ", stdout);
    for (uint32_t cpu = 0; cpu < numCpus; cpu++) std::printf("   PCPU %2u ", cpu);

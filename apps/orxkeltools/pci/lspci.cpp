@@ -87,9 +87,8 @@ ModuleTable ListModules() {
       std::fputs("ListModules: Not enough memory\n", stderr);
       return nullptr;
    }
-   KEL_ParamList *rawList = nullptr;
-   KEL_Status status = GetInstanceList(KEL_NODE_system_modules, nullptr, &rawList);
-   ParamListPtr list(rawList);
+   ParamListPtr list;
+   KEL_Status status = GetInstanceList(KEL_NODE_system_modules, nullptr, &list);
    if (status != KEL_STATUS_OK) {
       std::fprintf(stderr, "ListModules: error fetching orvik module list - 0x%x\n", status);
       return nullptr;
@@ -305,9 +304,8 @@ int ShowFunction(Walk &w) {
 // every level.
 int WalkLevel(Walk &w, int level) {
    if (level == kFunctionLevel) return ShowFunction(w);
-   KEL_ParamList *rawList = nullptr;
-   KEL_Status status = GetInstanceList(*kLevels[level].node, level == 0 ? nullptr : w.keys, &rawList);
-   ParamListPtr list(rawList);
+   ParamListPtr list;
+   KEL_Status status = GetInstanceList(*kLevels[level].node, level == 0 ? nullptr : w.keys, &list);
    if (status != KEL_STATUS_OK) {
       std::fprintf(stderr, "ListPCI: error fetching PCI %s list 0x%x\n", kLevels[level].name, status);
       return 1;

@@ -69,9 +69,8 @@ KEL_Status GetDevice(const Address &a, ParamListPtr *device) {
    };
    bool first = true;
    for (const auto &level : levels) {
-      KEL_ParamList *rawList = nullptr;
-      KEL_Status status = GetInstanceList(*level.node, first ? nullptr : keys.get(), &rawList);
-      ParamListPtr list(rawList);
+      ParamListPtr list;
+      KEL_Status status = GetInstanceList(*level.node, first ? nullptr : keys.get(), &list);
       if (status != KEL_STATUS_OK) return status;
       first = false;
       const KEL_Param *found = nullptr;

@@ -231,12 +231,7 @@ int BootOptionMain(int argc, char **argv) {
    if (req.modules) {
       Label(req, "Modules : ");
       ParamListPtr tardisks;
-      {
-         KEL_ParamList *list = nullptr;
-         KEL_Status status = GetInstanceList(KEL_NODE_system_corafs_tardisks, nullptr, &list);
-         tardisks.reset(list);
-         if (status != KEL_STATUS_OK) return 1;
-      }
+      if (GetInstanceList(KEL_NODE_system_corafs_tardisks, nullptr, &tardisks) != KEL_STATUS_OK) return 1;
       // One key list serves every tardisk: its name is pushed, read and popped.
       ParamListPtr keys(KEL_ParamListCreate(1, 1));
       if (!keys) return 1;

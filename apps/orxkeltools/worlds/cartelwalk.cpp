@@ -24,10 +24,9 @@ PatternResult CompilePattern(const char *command, const char *text, PatternPtr *
 KEL_Status WalkCartels(const regex_t &pattern, bool full, CartelVisitor visit, void *context) {
    ParamListPtr keys(KEL_ParamListCreate(1, 1));
    if (!keys) return KEL_STATUS_NO_MEMORY;
-   KEL_ParamList *raw = nullptr;
-   KEL_Status status = GetInstanceList(KEL_NODE_userworld_cartel, nullptr, &raw);
+   ParamListPtr cartels;
+   KEL_Status status = GetInstanceList(KEL_NODE_userworld_cartel, nullptr, &cartels);
    if (status != KEL_STATUS_OK) return status;
-   ParamListPtr cartels(raw);
 
    // One byte beyond the record keeps a command line that fills it terminated.
    char cmdline[kCmdlineSize + 1];

@@ -67,9 +67,9 @@ void PrintMappingRow(const CartelRow &row, const uint8_t *rec) {
 
 // Lists the instances of node under the keys; null when the listing fails.
 ParamListPtr ListUnder(KEL_Node node, const KEL_ParamList *keys) {
-   KEL_ParamList *raw = nullptr;
-   if (GetInstanceList(node, keys, &raw) != KEL_STATUS_OK) return nullptr;
-   return ParamListPtr(raw);
+   ParamListPtr list;
+   GetInstanceList(node, keys, &list);
+   return list;
 }
 
 // Prints the fd rows of the cartel whose key ends keys.  A record that cannot
@@ -142,13 +142,12 @@ KEL_Status WalkWorldList() {
       std::fputs("WalkWorldList: Not enough memory\n", stderr);
       return KEL_STATUS_FAILURE;
    }
-   KEL_ParamList *raw = nullptr;
-   KEL_Status status = GetInstanceList(KEL_NODE_userworld_cartel, nullptr, &raw);
+   ParamListPtr cartels;
+   KEL_Status status = GetInstanceList(KEL_NODE_userworld_cartel, nullptr, &cartels);
    if (status != KEL_STATUS_OK) {
       std::fprintf(stderr, "WalkWorldList: error fetching world list 0x%x\n", status);
       return status;
    }
-   ParamListPtr cartels(raw);
 
    std::puts(kHeader);
    std::puts(kRule);

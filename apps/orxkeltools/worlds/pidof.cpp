@@ -99,13 +99,12 @@ unsigned SearchName(const Search &search, std::string_view name) {
       std::fputs("CartelList: Not enough memory\n", stderr);
       return 0;
    }
-   KEL_ParamList *raw = nullptr;
-   KEL_Status status = GetInstanceList(KEL_NODE_userworld_cartel, nullptr, &raw);
+   ParamListPtr cartels;
+   KEL_Status status = GetInstanceList(KEL_NODE_userworld_cartel, nullptr, &cartels);
    if (status != KEL_STATUS_OK) {
       std::fprintf(stderr, "CartelList: error fetching cartel list 0x%x\n", status);
       return 0;
    }
-   ParamListPtr cartels(raw);
    unsigned count = 0;
    uint32_t n = KEL_ParamListUsedCount(cartels.get());
    for (uint32_t i = 0; i < n; i++) {

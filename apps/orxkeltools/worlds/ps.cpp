@@ -698,10 +698,9 @@ bool WorldList(uint32_t options, uint32_t requestedUserspace) {
 
    ParamListPtr keys(KEL_ParamListCreate(1, 1));
    if (!keys) return OutOfMemory();
-   KEL_ParamList *listed = nullptr;
+   ParamListPtr worlds;
    KEL_Node listNode = (options & kOptCartels) ? KEL_NODE_userworld_cartel : KEL_NODE_world;
-   g.latest = GetInstanceList(listNode, nullptr, &listed);
-   ParamListPtr worlds(listed);
+   g.latest = GetInstanceList(listNode, nullptr, &worlds);
    if (g.latest != KEL_STATUS_OK) {
       std::fprintf(stderr, "WorldList: error fetching world list 0x%x\n", g.latest);
       return false;

@@ -32,13 +32,12 @@ int UserspaceofMain(int argc, char **argv) {
       std::fputs("CartelList: Not enough memory\n", stderr);
       return 1;
    }
-   KEL_ParamList *raw = nullptr;
-   KEL_Status status = GetInstanceList(KEL_NODE_world, nullptr, &raw);
+   ParamListPtr worlds;
+   KEL_Status status = GetInstanceList(KEL_NODE_world, nullptr, &worlds);
    if (status != KEL_STATUS_OK) {
       std::fprintf(stderr, "CartelList: error fetching cartel list 0x%x\n", status);
       return 1;
    }
-   ParamListPtr worlds(raw);
 
    // Every world is read: the walk does not stop at the first hit.
    unsigned printed = 0;
