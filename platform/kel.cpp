@@ -97,7 +97,7 @@ std::span<const uint8_t, 16> ToolSignature() { return std::span<const uint8_t, 1
 
 const char *ToolBuildDate() { return ORXKEL_BUILD_DATE; }
 
-bool TreeLookup(Op op, KEL_Node node, const KEL_ParamList *keys, CacheHit *hit, KEL_Status *status) {
+static bool TreeLookup(Op op, KEL_Node node, const KEL_ParamList *keys, CacheHit *hit, KEL_Status *status) {
    Tree &t = TheTree();
    if (!t.loaded) {
       *status = KEL_STATUS_NO_TREE;
@@ -110,6 +110,12 @@ bool TreeLookup(Op op, KEL_Node node, const KEL_ParamList *keys, CacheHit *hit, 
    }
    *status = t.reader.Lookup(*lookup, hit);
    return *status == KEL_STATUS_OK;
+}
+
+void CopyRecord(std::string_view stored, void *buf, uint32_t size) {
+   size_t n = std::min<size_t>(stored.size(), size);
+   if (n > 0) std::memcpy(buf, stored.data(), n);
+   if (n < size) std::memset(static_cast<char *>(buf) + n, 0, size - n);
 }
 
 std::optional<std::string_view> TreeMeta(std::string_view name) {
@@ -186,13 +192,15 @@ KEL_Status KEL_Get(KEL_Node node, const KEL_ParamList *keys, void *buf, uint32_t
    if (buf == nullptr && size > 0) return KEL_STATUS_BAD_PARAM;
    if (KeyCount(keys) != LevelCount(info->path)) return KEL_STATUS_BAD_KEY_COUNT;
    KEL_Status status;
-   if (InSimulator() && SimulatorGet(*info, keys, buf, size, &status)) return status;
+   if (InSimulator() && SimulatorClock(*info, buf, size, &status)) return status;
    CacheHit hit;
-   if (!TreeLookup(Op::Get, node, keys, &hit, &status)) return status;
+   if (!TreeLookup(Op::Get, node, keys, &hit, &status)) {
+      // A record stored in the snapshot wins; the simulator answers the rest.
+      if (status == KEL_STATUS_NOT_FOUND && InSimulator()) return SimulatorInodeStats(*info, keys, buf, size);
+      return status;
+   }
    if (hit.status != KEL_STATUS_OK) return hit.status;
-   size_t n = std::min<size_t>(hit.data.size(), size);
-   if (n > 0) std::memcpy(buf, hit.data.data(), n);
-   if (n < size) std::memset(static_cast<char *>(buf) + n, 0, size - n);
+   CopyRecord(hit.data, buf, size);
    return KEL_STATUS_OK;
 }
 

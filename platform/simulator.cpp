@@ -165,18 +165,12 @@ void PutText(uint8_t *record, size_t offset, size_t width, std::string_view text
    std::memcpy(record + offset, text.data(), n);
 }
 
-bool InodeStats(uint64_t ino, uint8_t *record, KEL_Status *status) {
+KEL_Status InodeStats(uint64_t ino, uint8_t *record) {
    Corafs &fs = TheCorafs();
    auto it = fs.inodes.find(ino_t(ino));
-   if (it == fs.inodes.end() || it->second.rule < 0) {
-      *status = KEL_STATUS_NOT_FOUND;
-      return true;
-   }
+   if (it == fs.inodes.end() || it->second.rule < 0) return KEL_STATUS_NOT_FOUND;
    const Rule &rule = fs.rules[size_t(it->second.rule)];
-   if (rule.kind == RuleKind::Foreign) {
-      *status = KEL_STATUS_NOT_FOUND;
-      return true;
-   }
+   if (rule.kind == RuleKind::Foreign) return KEL_STATUS_NOT_FOUND;
    // Inode stats record: flags at 4, link state at 20, size at 28, tardisk
    // name at 32, ramdisk name at 160, file name at 288.
    std::memset(record, 0, 544);
@@ -185,40 +179,27 @@ bool InodeStats(uint64_t ino, uint8_t *record, KEL_Status *status) {
    StoreU32(record + 28, uint32_t(it->second.size));
    PutText(record, tardisk ? 32 : 160, 128, rule.disk);
    PutText(record, 288, 256, it->second.name);
-   *status = KEL_STATUS_OK;
-   return true;
+   return KEL_STATUS_OK;
 }
 
 }  // namespace
 
-bool SimulatorGet(const NodeInfo &node, const KEL_ParamList *keys, void *buf, uint32_t size,
-                  KEL_Status *status) {
-   if (node.number == KEL_NODE_hardware_chipset_rtc) {
-      uint8_t record[kRtcSize];
-      if (!ReadRtc(record)) return false;
-      size_t n = std::min<size_t>(size, kRtcSize);
-      std::memcpy(buf, record, n);
-      if (n < size) std::memset(static_cast<char *>(buf) + n, 0, size - n);
-      *status = KEL_STATUS_OK;
-      return true;
-   }
-   if (node.number == KEL_NODE_system_corafs_inodes_stats) {
-      // A record stored in the snapshot wins over the directory tree.
-      CacheHit hit;
-      KEL_Status found;
-      if (TreeLookup(Op::Get, node.number, keys, &hit, &found) || found != KEL_STATUS_NOT_FOUND) return false;
-      const KEL_Param *key = KEL_ParamListGetParam(keys, 0);
-      if (key->kind == KEL_PARAM_STRING) return false;
-      uint8_t record[544];
-      InodeStats(key->value, record, status);
-      if (*status == KEL_STATUS_OK) {
-         size_t n = std::min<size_t>(size, sizeof record);
-         std::memcpy(buf, record, n);
-         if (n < size) std::memset(static_cast<char *>(buf) + n, 0, size - n);
-      }
-      return true;
-   }
-   return false;
+bool SimulatorClock(const NodeInfo &node, void *buf, uint32_t size, KEL_Status *status) {
+   uint8_t record[kRtcSize];
+   if (node.number != KEL_NODE_hardware_chipset_rtc || !ReadRtc(record)) return false;
+   CopyRecord({reinterpret_cast<const char *>(record), sizeof record}, buf, size);
+   *status = KEL_STATUS_OK;
+   return true;
+}
+
+KEL_Status SimulatorInodeStats(const NodeInfo &node, const KEL_ParamList *keys, void *buf, uint32_t size) {
+   const KEL_Param *key = KEL_ParamListGetParam(keys, 0);
+   if (node.number != KEL_NODE_system_corafs_inodes_stats || key->kind == KEL_PARAM_STRING)
+      return KEL_STATUS_NOT_FOUND;
+   uint8_t record[544];
+   KEL_Status status = InodeStats(key->value, record);
+   if (status == KEL_STATUS_OK) CopyRecord({reinterpret_cast<const char *>(record), sizeof record}, buf, size);
+   return status;
 }
 
 KEL_Status SimulatorSet(const NodeInfo &node, const KEL_ParamList *input, void *buf, uint32_t size) {

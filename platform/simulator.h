@@ -12,14 +12,17 @@ struct stat;
 
 namespace kelplat {
 
-// Shared with kel.cpp: lookups in the loaded tree.
-bool TreeLookup(Op op, KEL_Node node, const KEL_ParamList *keys, CacheHit *hit, KEL_Status *status);
+// Shared with kel.cpp.
+// Fills exactly size bytes: a shorter record is zero-filled, a longer one cut.
+void CopyRecord(std::string_view stored, void *buf, uint32_t size);
 std::optional<std::string_view> TreeMeta(std::string_view name);
 const char *SimulatorPath();
 
-// Reads the simulator answers itself; false leaves the read to the snapshot.
-bool SimulatorGet(const NodeInfo &node, const KEL_ParamList *keys, void *buf, uint32_t size,
-                  KEL_Status *status);
+// The real-time clock once it has been set; false leaves the read to the snapshot.
+bool SimulatorClock(const NodeInfo &node, void *buf, uint32_t size, KEL_Status *status);
+// A read the snapshot has no entry for: inode statistics made from the real
+// file; NOT_FOUND for anything else.
+KEL_Status SimulatorInodeStats(const NodeInfo &node, const KEL_ParamList *keys, void *buf, uint32_t size);
 KEL_Status SimulatorSet(const NodeInfo &node, const KEL_ParamList *input, void *buf, uint32_t size);
 int SimulatorLstat(const char *path, struct stat *st);
 

@@ -189,8 +189,3 @@ int main(int argc, char **argv) {
    return 1;
 }
 #endif
-
-int CommandNotBuilt(const char *name) {
-   std::fprintf(stderr, "%s: this command is not available yet\n", name);
-   return 1;
-}

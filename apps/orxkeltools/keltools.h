@@ -16,9 +16,6 @@ extern "C" [[noreturn]] void Panic(const char *fmt, ...) __attribute__((format(p
 extern "C" void Warning(const char *fmt, ...) __attribute__((format(printf, 1, 2)));
 
 void SizeToString(uint64_t bytes, char *buf, size_t size);
-
-// Placeholder handler for a command that is not available yet.
-int CommandNotBuilt(const char *name);
 KEL_Status GetInstanceList(KEL_Node node, const KEL_ParamList *keys, KEL_ParamList **list);
 int AddParamToList(const KEL_Param *param, KEL_ParamList *list);
 

@@ -4,7 +4,7 @@
 
 #include <iterator>
 
-#include "worlds/numbers.h"
+#include "numbers.h"
 #include "worlds/signals.h"
 
 namespace {

@@ -43,17 +43,7 @@ constexpr unsigned kExtDump = 16;
 
 constexpr char kDetailedHeader[] = "%-12s %-19s %-14s %-1s %-12s %-8s\n";
 
-// The walk's levels: the key list holds one key per level, in this order.
-struct Level {
-   const KEL_Node *node;
-   const char *name;  // for "ListPCI: error fetching PCI %s list"
-};
-constexpr Level kLevels[] = {
-   {&KEL_NODE_hardware_pci_seg, "seg"},
-   {&KEL_NODE_hardware_pci_seg_bus, "bus"},
-   {&KEL_NODE_hardware_pci_seg_bus_slot, "slot"},
-   {&KEL_NODE_hardware_pci_seg_bus_slot_func, "func"},
-};
+// The walk's levels are kPciLevels; the key list holds one key per level.
 constexpr int kFunctionLevel = 4;
 
 // Module record (KEL_NODE_system_modules_general, 700 bytes): the name at 0
@@ -305,9 +295,9 @@ int ShowFunction(Walk &w) {
 int WalkLevel(Walk &w, int level) {
    if (level == kFunctionLevel) return ShowFunction(w);
    ParamListPtr list;
-   KEL_Status status = GetInstanceList(*kLevels[level].node, level == 0 ? nullptr : w.keys, &list);
+   KEL_Status status = GetInstanceList(*kPciLevels[level].node, level == 0 ? nullptr : w.keys, &list);
    if (status != KEL_STATUS_OK) {
-      std::fprintf(stderr, "ListPCI: error fetching PCI %s list 0x%x\n", kLevels[level].name, status);
+      std::fprintf(stderr, "ListPCI: error fetching PCI %s list 0x%x\n", kPciLevels[level].name, status);
       return 1;
    }
    uint32_t count = KEL_ParamListUsedCount(list.get());

@@ -4,10 +4,11 @@
 
 #include <cstdint>
 #include <cstdio>
-#include <cstdlib>
+#include <iterator>
 #include <utility>
 
 #include "keltools.h"
+#include "numbers.h"
 #include "pci/pcirecord.h"
 #include "records.h"
 
@@ -39,15 +40,6 @@ struct Address {
    int32_t func = -1;
 };
 
-// A decimal number as strtol reads it on the 32-bit host: text that is no
-// number gives 0, and values beyond 32 bits stop at the limits.
-int32_t ParseNumber(const char *text) {
-   long long value = std::strtoll(text, nullptr, 10);
-   if (value > INT32_MAX) return INT32_MAX;
-   if (value < INT32_MIN) return INT32_MIN;
-   return int32_t(value);
-}
-
 // Finds the function's segment, bus, slot and function keys level by level
 // and returns them as a new key list.  Only a number that is not there is
 // reported here; the callers report the rest.
@@ -57,30 +49,20 @@ KEL_Status GetDevice(const Address &a, ParamListPtr *device) {
       std::fputs("Failed to allocate param list (size = 1)\n", stderr);
       return KEL_STATUS_NO_RESOURCES;
    }
-   const struct {
-      const KEL_Node *node;
-      const char *name;
-      int32_t wanted;
-   } levels[] = {
-      {&KEL_NODE_hardware_pci_seg, "seg", a.seg},
-      {&KEL_NODE_hardware_pci_seg_bus, "bus", a.bus},
-      {&KEL_NODE_hardware_pci_seg_bus_slot, "slot", a.slot},
-      {&KEL_NODE_hardware_pci_seg_bus_slot_func, "func", a.func},
-   };
-   bool first = true;
-   for (const auto &level : levels) {
+   const int32_t wanted[] = {a.seg, a.bus, a.slot, a.func};
+   for (size_t l = 0; l < std::size(kPciLevels); l++) {
+      const PciLevel &level = kPciLevels[l];
       ParamListPtr list;
-      KEL_Status status = GetInstanceList(*level.node, first ? nullptr : keys.get(), &list);
+      KEL_Status status = GetInstanceList(*level.node, l == 0 ? nullptr : keys.get(), &list);
       if (status != KEL_STATUS_OK) return status;
-      first = false;
       const KEL_Param *found = nullptr;
       uint32_t count = KEL_ParamListUsedCount(list.get());
       for (uint32_t i = 0; i < count && found == nullptr; i++) {
          const KEL_Param *param = KEL_ParamListGetParam(list.get(), i);
-         if (param && int32_t(KEL_ParamGetInt(param)) == level.wanted) found = param;
+         if (param && int32_t(KEL_ParamGetInt(param)) == wanted[l]) found = param;
       }
       if (found == nullptr) {
-         std::fprintf(stderr, "%s: invalid %s %d\n", "GetDevice", level.name, level.wanted);
+         std::fprintf(stderr, "%s: invalid %s %d\n", "GetDevice", level.name, wanted[l]);
          return KEL_STATUS_BAD_PARAM;
       }
       if (!AddParamToList(found, keys.get())) return KEL_STATUS_FAILURE;
@@ -136,10 +118,10 @@ int PciInfoMain(int argc, char **argv) {
    int c;
    while ((c = getopt(argc, argv, kOptions)) != -1) {
       switch (c) {
-      case 'n': a.seg = ParseNumber(optarg); break;
-      case 'b': a.bus = ParseNumber(optarg); break;
-      case 's': a.slot = ParseNumber(optarg); break;
-      case 'f': a.func = ParseNumber(optarg); break;
+      case 'n': a.seg = StrtolInt32(optarg); break;
+      case 'b': a.bus = StrtolInt32(optarg); break;
+      case 's': a.slot = StrtolInt32(optarg); break;
+      case 'f': a.func = StrtolInt32(optarg); break;
       case 'h': std::fputs(kUsage, stderr); return 0;
       case 'i': actions |= kPrintIrq; break;
       case 'c': actions |= kPrintConfig; break;

@@ -6,6 +6,21 @@
 #include <cstddef>
 #include <cstdint>
 
+#include "kel/kel.h"
+
+// The levels above a PCI function, in key order, with the word messages use
+// for each: segment, bus, slot, function.
+struct PciLevel {
+   const KEL_Node *node;
+   const char *name;
+};
+inline constexpr PciLevel kPciLevels[] = {
+   {&KEL_NODE_hardware_pci_seg, "seg"},
+   {&KEL_NODE_hardware_pci_seg_bus, "bus"},
+   {&KEL_NODE_hardware_pci_seg_bus_slot, "slot"},
+   {&KEL_NODE_hardware_pci_seg_bus_slot_func, "func"},
+};
+
 // PCI function record (KEL_NODE_hardware_pci_seg_bus_slot_func_pciConfigHeader,
 // 128 bytes, packed, little-endian):
 //

@@ -10,7 +10,7 @@
 
 #include "keltools.h"
 #include "records.h"
-#include "worlds/numbers.h"
+#include "numbers.h"
 #include "worlds/worldinfo.h"
 
 namespace {

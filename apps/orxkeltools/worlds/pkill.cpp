@@ -9,7 +9,7 @@
 
 #include "keltools.h"
 #include "worlds/cartelwalk.h"
-#include "worlds/numbers.h"
+#include "numbers.h"
 #include "worlds/signals.h"
 
 namespace {

@@ -17,6 +17,7 @@
 #include <string_view>
 
 #include "keltools.h"
+#include "numbers.h"
 #include "records.h"
 #include "worlds/worldinfo.h"
 
@@ -731,22 +732,6 @@ bool WorldList(uint32_t options, uint32_t requestedUserspace) {
    return printed && g.latest == KEL_STATUS_OK;
 }
 
-// -U takes its number as a 32-bit strtoul would: a minus sign negates, a
-// number beyond 32 bits gives the largest value, and no number gives 0.
-uint32_t ParseUserspace(const char *text) {
-   const char *p = text;
-   while (*p == ' ' || (*p >= '\t' && *p <= '\r')) p++;
-   bool negative = *p == '-';
-   if (*p == '-' || *p == '+') p++;
-   if (*p < '0' || *p > '9') return 0;
-   uint64_t value = 0;
-   for (; *p >= '0' && *p <= '9'; p++) {
-      value = value * 10 + uint64_t(*p - '0');
-      if (value > UINT32_MAX) return UINT32_MAX;
-   }
-   return negative ? uint32_t(0 - value) : uint32_t(value);
-}
-
 }  // namespace
 
 int PsMain(int argc, char **argv) {
@@ -770,7 +755,7 @@ int PsMain(int argc, char **argv) {
          return 1;
       }
       options |= found->bits;
-      if (c == 'U' && optarg != nullptr) requestedUserspace = ParseUserspace(optarg);
+      if (c == 'U' && optarg != nullptr) requestedUserspace = StrtoulUInt32(optarg);
    }
    if (optind < argc) {
       std::fputs("ps: no non-option arguments\n", stderr);

@@ -4,7 +4,7 @@
 
 #include "keltools.h"
 #include "records.h"
-#include "worlds/numbers.h"
+#include "numbers.h"
 #include "worlds/worldinfo.h"
 
 namespace {

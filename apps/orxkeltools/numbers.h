@@ -2,8 +2,8 @@
 // them, so that a build with 64-bit longs gives the same numbers: a value
 // out of range is clamped instead of being cut to its low 32 bits (which
 // could turn an absurd signal argument into a real signal number).
-#ifndef ORXKELTOOLS_WORLDS_NUMBERS_H
-#define ORXKELTOOLS_WORLDS_NUMBERS_H
+#ifndef ORXKELTOOLS_NUMBERS_H
+#define ORXKELTOOLS_NUMBERS_H
 
 #include <cctype>
 #include <cerrno>
