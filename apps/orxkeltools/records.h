@@ -33,4 +33,14 @@ inline std::string_view ReadText(const uint8_t *rec, size_t off, size_t width) {
    return {p, nul ? size_t(static_cast<const char *>(nul) - p) : width};
 }
 
+// Writers for the records the tool sends (data-call requests, test input).
+inline void PutU32(uint8_t *rec, size_t off, uint32_t value) {
+   for (int i = 0; i < 4; i++) rec[off + i] = uint8_t(value >> 8 * i);
+}
+
+inline void PutU64(uint8_t *rec, size_t off, uint64_t value) {
+   PutU32(rec, off, uint32_t(value));
+   PutU32(rec, off + 4, uint32_t(value >> 32));
+}
+
 #endif

@@ -48,6 +48,16 @@ enum {
 #undef KEL_NODE_DEF
 
 /*
+ * Record sizes, KEL_RECORD_SIZE_<name>, so that a reader can check at compile
+ * time that its layout has the size the node table gives.
+ */
+enum {
+#define KEL_NODE_DEF(name, number, path, size, flags) KEL_RECORD_SIZE_##name = size,
+#include "kel/nodes.def"
+#undef KEL_NODE_DEF
+};
+
+/*
  * Parameter lists hold keys (and the inputs of KEL_Set).  An entry's first
  * 32-bit word is its kind: KEL_PARAM_INT (a 64-bit integer) or
  * KEL_PARAM_STRING (a text).
