@@ -5,6 +5,7 @@
 // name of argv[0].
 #include "keltools.h"
 
+#include <cerrno>
 #include <cstdarg>
 #include <cstdio>
 #include <cstdlib>
@@ -12,6 +13,14 @@
 #include <string_view>
 
 uint8_t InvokedWithCache = 0;
+
+namespace {
+int gOutputError = 0;  // the first errno of a failed raw write to standard output
+}
+
+void NoteOutputError(int err) {
+   if (gOutputError == 0) gOutputError = err != 0 ? err : EIO;
+}
 
 namespace {
 

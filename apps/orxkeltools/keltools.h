@@ -17,6 +17,11 @@ extern "C" uint8_t InvokedWithCache;
 extern "C" [[noreturn]] void Panic(const char *fmt, ...) __attribute__((format(printf, 1, 2)));
 extern "C" void Warning(const char *fmt, ...) __attribute__((format(printf, 1, 2)));
 
+// Records that writing the command's output failed with errno err (for
+// output written with write() rather than stdio).  At exit the tool reports
+// the first such error once and ends with the command's failure status.
+void NoteOutputError(int err);
+
 void SizeToString(uint64_t bytes, char *buf, size_t size);
 KEL_Status GetInstanceList(KEL_Node node, const KEL_ParamList *keys, KEL_ParamList **list);
 int AddParamToList(const KEL_Param *param, KEL_ParamList *list);
