@@ -12,11 +12,18 @@
 #include <cstring>
 #include <string_view>
 
+#include <fcntl.h>
+#include <unistd.h>
+
 uint8_t InvokedWithCache = 0;
 
 namespace {
 int gOutputError = 0;  // the first errno of a failed raw write to standard output
-}
+// What the exit check reports a write error under, and the status it then
+// ends with: the running command's name and failure status.
+const char *gCommandName = "orxkeltools";
+int gWriteFailureStatus = 1;
+}  // namespace
 
 void NoteOutputError(int err) {
    if (gOutputError == 0) gOutputError = err != 0 ? err : EIO;
@@ -27,6 +34,7 @@ namespace {
 struct Command {
    const char *name;
    int (*handler)(int argc, char **argv);
+   int failureStatus = 1;  // the exit status of a failed run (pgrep's 1 means "no match")
 };
 
 // Both command listings print the names in this order.
@@ -45,7 +53,7 @@ constexpr Command kCommands[] = {
    {"lsof", LsofMain},
    {"vdf", VdfMain},
    {"pkill", PkillMain},
-   {"pgrep", PgrepMain},
+   {"pgrep", PgrepMain, 3},
    {"uptime", UptimeMain},
 };
 
@@ -81,6 +89,34 @@ void VReport(const char *fmt, va_list ap) {
    char buf[1024];
    std::vsnprintf(buf, sizeof buf, fmt, ap);
    std::fputs(buf, stderr);
+}
+
+// Descriptors 0-2 that are closed are opened on /dev/null, read-only: writes
+// to a closed standard output then fail (and are reported) instead of
+// landing in whatever file the command opens next.
+void OpenMissingStandardDescriptors() {
+   for (int fd = 0; fd <= 2; fd++) {
+      if (fcntl(fd, F_GETFD) != -1 || errno != EBADF) continue;
+      int opened = open("/dev/null", O_RDONLY);
+      if (opened != fd) {
+         // Descriptors are handed out lowest first, so anything else means
+         // /dev/null could not be opened; give up rather than loop.
+         if (opened >= 0) close(opened);
+         return;
+      }
+   }
+}
+
+// Runs at every exit, also through exit() in help texts and Panic: output
+// that could not be written makes the run fail, so that a cut file never
+// passes for a complete one.
+void CheckOutputAtExit() {
+   errno = 0;
+   bool failed = std::fflush(stdout) != 0 || std::ferror(stdout);
+   int err = gOutputError != 0 ? gOutputError : errno != 0 ? errno : EIO;
+   if (!failed && gOutputError == 0) return;
+   std::fprintf(stderr, "%s: write error on standard output: %s\n", gCommandName, std::strerror(err));
+   _exit(gWriteFailureStatus);
 }
 
 }  // namespace
@@ -142,6 +178,8 @@ int AddParamToList(const KEL_Param *param, KEL_ParamList *list) {
 
 #ifndef ORXKEL_NO_MAIN
 int main(int argc, char **argv) {
+   OpenMissingStandardDescriptors();
+   std::atexit(CheckOutputAtExit);
    if (argc < 1 || argv[0] == nullptr) ShortUsage();
 
    bool ownName = BaseName(argv[0]).substr(0, kOwnName.size()) == kOwnName;
@@ -184,8 +222,12 @@ int main(int argc, char **argv) {
    }
 
    std::string_view name = BaseName(argv[0]);
-   for (const Command &c : kCommands)
-      if (name == c.name) return c.handler(argc, argv);
+   for (const Command &c : kCommands) {
+      if (name != c.name) continue;
+      gCommandName = c.name;
+      gWriteFailureStatus = c.failureStatus;
+      return c.handler(argc, argv);
+   }
 
    std::fprintf(stderr,
                 "usage: %s [options] [function] [arguments]\n"

@@ -274,8 +274,13 @@ class Runner:
                         cache, exe] + argv
                 exe = sys.executable
             stdin = subprocess.DEVNULL
-            r = subprocess.run(argv, executable=exe, env=env, cwd=cwd, stdin=stdin,
-                               capture_output=True, timeout=float(case.get("timeout", "60")))
+            timeout = float(case.get("timeout", "60"))
+            target = case.get("stdout")
+            if target is None:
+                r = subprocess.run(argv, executable=exe, env=env, cwd=cwd, stdin=stdin,
+                                   capture_output=True, timeout=timeout)
+            else:
+                r = run_with_stdout(target, argv, exe, env, cwd, stdin, timeout)
             values["@STATUS"] = str(r.returncode)
             failures = []
             for command in case.all("check"):
@@ -400,6 +405,23 @@ def diff(name, want, actual):
     b = escape(actual).splitlines(keepends=True)
     lines = difflib.unified_diff(a, b, "expected " + name, "actual " + name, lineterm="")
     return "".join(l if l.endswith("\n") else l + "\n" for l in lines).rstrip("\n")
+
+
+def run_with_stdout(target, argv, exe, env, cwd, stdin, timeout):
+    """Runs the tool with standard output on /dev/full ("full") or closed
+    ("closed"); the captured standard output is then empty."""
+    if target == "full":
+        with open("/dev/full", "wb") as full:
+            r = subprocess.run(argv, executable=exe, env=env, cwd=cwd, stdin=stdin, stdout=full,
+                               stderr=subprocess.PIPE, timeout=timeout)
+    elif target == "closed":
+        r = subprocess.run(argv, executable=exe, env=env, cwd=cwd, stdin=stdin,
+                           stdout=subprocess.DEVNULL, stderr=subprocess.PIPE, timeout=timeout,
+                           preexec_fn=lambda: os.close(1))
+    else:
+        raise RuntimeError("stdout: full or closed, not %r" % target)
+    r.stdout = b""
+    return r
 
 
 def self_exec(kelcache, cache, exe, argv):
