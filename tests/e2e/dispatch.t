@@ -199,12 +199,6 @@ Functions:
    pkill
    pgrep
    uptime
-=== case simulator, an unknown word after the own name
-snapshot: tiny
-mode: sim
-run: frobnicate
-exit: 1
---- stderr (any)
 === case simulator, three words stay live and -c is looked up as a command
 snapshot: tiny
 mode: sim
