@@ -1,6 +1,7 @@
 // libFuzzer target for the PCI ID loader: the input becomes an override
 // file and pci.ids (split at the first byte 0xff), and each load is followed
-// by lookups of every row it made, through the index and the plain scan.
+// by lookups of every device row it made, through the index and the plain
+// scan, and of every class-level and subclass-level row.
 // The loader's messages are expected: run with -close_fd_mask=2.
 #include <stdlib.h>
 #include <sys/stat.h>
@@ -46,9 +47,15 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t *data, size_t size) {
       if (indexed == nullptr || PciName(indexed->name).size() > 127 || PciName(indexed->vendorName).size() > 63)
          abort();
    }
+   // Class-level and subclass-level rows are found by a lookup of their own
+   // codes.  A prog-if row need not be: one that comes before any class
+   // line stands under a class that no row names.
    for (int i = 0; i < PciClassCount(); i++) {
-      const PciClassEntry *c = LookupPciClass(uint16_t(PciClassRow(i).classId << 8 | PciClassRow(i).subclassId));
-      if (c == nullptr || PciName(c->className).size() > 63) abort();
+      const PciClassEntry &row = PciClassRow(i);
+      if (row.progIf != 0xff) continue;
+      const PciClassEntry *c = LookupPciClass(uint16_t(row.classId << 8 | row.subclassId));
+      if (c == nullptr || c->classId != row.classId || c->progIf != 0xff || PciName(c->className).size() > 63)
+         abort();
    }
    return 0;
 }

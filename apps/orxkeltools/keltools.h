@@ -52,18 +52,23 @@ class ScopedKey {
 public:
    // Copies an instance-list entry; AddParamToList reports a failure.
    ScopedKey(KEL_ParamList *keys, const KEL_Param *key) : keys_(keys), added_(AddParamToList(key, keys) != 0) {}
-   // Appends an integer key; a failure is left to the caller to report.
+   // Appends an integer key; a failure is left to the caller to report,
+   // with status().
    ScopedKey(KEL_ParamList *keys, uint64_t key)
-      : keys_(keys), added_(KEL_ParamListAddInt(keys, key) == KEL_STATUS_OK) {}
+      : keys_(keys), status_(KEL_ParamListAddInt(keys, key)), added_(status_ == KEL_STATUS_OK) {}
    ScopedKey(const ScopedKey &) = delete;
    ScopedKey &operator=(const ScopedKey &) = delete;
    ~ScopedKey() {
       if (added_) KEL_ParamListRemoveLastParam(keys_);
    }
    bool ok() const { return added_; }
+   // The status of an integer key's append (a copied key's failure has
+   // been reported by AddParamToList).
+   KEL_Status status() const { return status_; }
 
 private:
    KEL_ParamList *keys_;
+   KEL_Status status_ = KEL_STATUS_OK;
    bool added_;
 };
 

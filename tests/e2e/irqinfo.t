@@ -1,7 +1,7 @@
 irqinfo: the interrupt table.  Header and per-CPU columns, the devices
 column ("<ORX device>", "ORX device" for a key without text, the cut at 63
-characters), a blank column for an unreadable count, every failure message
-and the usage line.
+characters), a blank column for an unreadable count, the most CPUs the
+table shows (4096), every failure message and the usage line.
 
 === snapshot three-cpus
 {"buildDate": "Nov 30 2026",
@@ -51,19 +51,12 @@ and the usage line.
 === snapshot no-cookies
 {"buildDate": "Nov 30 2026",
  "tree": {"hardware": {"cpu": {"cpuInfo": {"numCpus": 2}}, "interrupts": {"cookieList": {}}}}}
+=== snapshot most-cpus extends three-cpus
+{"tree": {"hardware": {"cpu": {"cpuInfo": {"numCpus": 4096}}}}}
+=== snapshot too-many-cpus extends three-cpus
+{"tree": {"hardware": {"cpu": {"cpuInfo": {"numCpus": 4097}}}}}
 === case three CPUs: counts, flag-zero cookie, key without text, no devices, wide cookie
 snapshot: three-cpus
-run: irqinfo
-exit: 0
---- stdout
-Cookie    PCPU  0    PCPU  1    PCPU  2 
-0x0010:         5          0 12345678901 ORX ahci-0, ORX nic-p1
-0x0002:         1          2          3 <ORX device>
-0x0011:         7          8          9 ORX usb0, ORX device
-0x12345:18446744073709551615          1          1 
-=== case the same through the simulator
-snapshot: three-cpus
-mode: sim
 run: irqinfo
 exit: 0
 --- stdout
@@ -106,23 +99,23 @@ run: irqinfo
 exit: 0
 --- stdout
 Cookie    PCPU  0    PCPU  1 
-=== case -h gives the usage line
+=== case 4096 CPUs, the most the table shows: a column each, as for fewer
+snapshot: most-cpus
+run: irqinfo
+check: @BIN/orxkeltools -c @CACHE irqinfo > out && test "$(wc -l < out)" = 5
+check: { printf 'Cookie '; printf '   PCPU %2u ' $(seq 0 4095); echo; } > header && head -n 1 out | cmp - header
+check: test "$(sed -n 2p out)" = "0x0010:         5          0 12345678901 $(printf '%40930s' '')ORX ahci-0, ORX nic-p1"
+exit: 0
+--- stdout (any)
+=== case more than 4096 CPUs: refused before the header
+snapshot: too-many-cpus
+run: irqinfo
+exit: 1
+--- stderr
+InterruptInfo: too many CPUs - 4097 (at most 4096)
+=== case any argument, -h included, gives the usage line
 snapshot: three-cpus
 run: irqinfo -h
-exit: 1
---- stderr
-irqinfo:      List interrupt information
-=== case any argument gives the usage line
-snapshot: three-cpus
-run: irqinfo 0x10
-exit: 1
---- stderr
-irqinfo:      List interrupt information
-=== case the usage line through the command link
-snapshot: three-cpus
-mode: sim
-exe: irqinfo
-argv: irqinfo --help
 exit: 1
 --- stderr
 irqinfo:      List interrupt information

@@ -245,6 +245,18 @@ TEST_F(PciIds, CommentInsideClassBlockDropsItsOpenRows) {
    EXPECT_EQ(ClassNames(0x0899), "Generic|Timing Card");
 }
 
+TEST_F(PciIds, ProgIfLineBeforeAnyClassLineKeepsAnUnreachableRow) {
+   // The row counts, so the build succeeds, but it stands under class 0 and
+   // subclass 0, which no class-level or subclass-level row names (the
+   // comment after it closes no block).
+   Write("pci.ids", "1af4  Red Hat, Inc.\nffff  Illegal\n\t\t01  Orphan\n# note\n" + kClasses.substr(kClasses.find('C')));
+   ASSERT_EQ(Load(), "");
+   ASSERT_EQ(PciClassCount(), 3);
+   EXPECT_EQ(PciClassRow(0).progIf, 1);
+   EXPECT_EQ(ClassNames(0x0000), "none");
+   EXPECT_EQ(ClassNames(0x0200), "Network controller|Ethernet controller");
+}
+
 TEST_F(PciIds, LongLinesArriveInPieces) {
    // 255 bytes: a tab, the ID, two blanks and 248 letters; the rest of the
    // line is a device line of its own.
@@ -345,11 +357,15 @@ TEST_F(PciIds, FfffInADirectoryFileEndsTheDevicePasses) {
    EXPECT_EQ(ClassNames(0x0200), "Network controller|Ethernet controller");
 }
 
-TEST_F(PciIds, ACorruptedFileNameEndsTheProcess) {
+TEST_F(PciIds, ACorruptedFileNameFailsTheLoad) {
    Write("pci.ids", kClasses);
    // The folder's path and the name come to more than 255 characters.
    Write("oem.pciids.d/" + std::string(250 - root_.size(), 'x') + ".ids", "");
-   EXPECT_EXIT(LoadPciIdTablesFrom(root_.c_str()), ::testing::ExitedWithCode(1), "^Found corrupted file name\n$");
+   ::testing::internal::CaptureStderr();
+   EXPECT_FALSE(LoadPciIdTablesFrom(root_.c_str()));
+   EXPECT_EQ(::testing::internal::GetCapturedStderr(), "Found corrupted file name\n");
+   EXPECT_EQ(PciDevCount(), 0);
+   EXPECT_EQ(PciClassCount(), 0);
 }
 
 TEST(PciIdsReal, DebianPciIdsLoadsWithoutAMessage) {

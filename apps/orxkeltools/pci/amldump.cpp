@@ -1,17 +1,26 @@
 // amldump: writes each ACPI table of the KEL tree to "<signature>.aml" in
 // the current directory, never overwriting a file.
+#include "pci/amldump.h"
+
 #include <fcntl.h>
 #include <unistd.h>
 
-#include <cctype>
 #include <cerrno>
 #include <cstdint>
 #include <cstdio>
-#include <new>
 #include <string_view>
 
 #include "keltools.h"
 #include "records.h"
+
+bool SafeSignature(std::string_view signature) {
+   if (signature.empty() || signature == "." || signature == ".." || signature.front() == '-') return false;
+   for (char ch : signature) {
+      unsigned char c = static_cast<unsigned char>(ch);
+      if (c == '/' || c < 0x20 || c > 0x7e) return false;
+   }
+   return true;
+}
 
 namespace {
 
@@ -21,51 +30,44 @@ namespace {
 //    4 set to NUL here, so that bytes 0..4 are the signature as a text
 //    5 length of this buffer's data  u32 (not aligned)
 //    9 the data: its first "length" bytes are the next piece of the table
-constexpr uint32_t kRecordSize = 131084;
+namespace acpibuffer {
+constexpr uint32_t kSize = 131084;
 constexpr size_t kSignature = 0;
 constexpr size_t kSignatureEnd = 4;
 constexpr size_t kLength = 5;
 constexpr size_t kData = 9;
-constexpr uint32_t kDataMax = kRecordSize - kData;
+constexpr uint32_t kDataMax = kSize - kData;
+}  // namespace acpibuffer
+static_assert(acpibuffer::kSize == KEL_RECORD_SIZE_hardware_acpi_tables_buffers);
 
 // Never replace an existing file: the open fails instead.
 constexpr int kOpenFlags = O_WRONLY | O_CREAT | O_EXCL | O_TRUNC;
 constexpr mode_t kOpenMode = 0600;
 
-// Counts the tables seen per signature, in a singly linked list: ACPI
-// tables are few, and the list gives the allocation failure its own answer.
-struct SignatureCounter {
-   struct Node {
-      Node *next;
-      char signature[5];
-      int32_t count;
-   };
-   Node *head = nullptr;
-   Node **tail = &head;
-
-   SignatureCounter() = default;
-   SignatureCounter(const SignatureCounter &) = delete;
-   SignatureCounter &operator=(const SignatureCounter &) = delete;
-   ~SignatureCounter() {
-      while (head != nullptr) {
-         Node *next = head->next;
-         delete head;
-         head = next;
-      }
-   }
-
+// Counts the tables seen per signature.  ACPI tables are few, so a plain
+// search of the signatures seen is enough.
+class SignatureCounter {
+public:
    // How many tables had this signature before (0 for the first), or -12
    // (the negated ENOMEM) when a new signature cannot be recorded.
    int32_t Next(std::string_view signature) {
-      for (Node *n = head; n != nullptr; n = n->next)
-         if (signature == n->signature) return n->count++;
-      Node *n = new (std::nothrow) Node{nullptr, {}, 1};
-      if (n == nullptr) return -ENOMEM;
-      signature.copy(n->signature, sizeof n->signature - 1);
-      *tail = n;
-      tail = &n->next;
+      for (size_t i = 0; i < count_; i++)
+         if (signature == seen_[i].signature) return seen_[i].count++;
+      if (!GrowArray(&seen_, &capacity_, count_ + 1)) return -ENOMEM;
+      Seen &added = seen_[count_++];
+      signature.copy(added.signature, sizeof added.signature - 1);
+      added.count = 1;
       return 0;
    }
+
+private:
+   struct Seen {
+      char signature[5];  // NUL-terminated: GrowArray zeroes new rows
+      int32_t count;
+   };
+   MallocPtr<Seen> seen_;
+   size_t capacity_ = 0;
+   size_t count_ = 0;
 };
 
 // Closes the table file on every path.
@@ -76,19 +78,11 @@ struct FileCloser {
    }
 };
 
-// A signature becomes a file name in the current directory: one holding a
-// '/', or one that is empty, "." or "..", could name a file elsewhere or an
-// odd one, and is refused.
-bool SafeSignature(std::string_view signature) {
-   return !signature.empty() && signature.find('/') == std::string_view::npos && signature != "." &&
-          signature != "..";
-}
-
 // Writes the signature for a message, other than printable bytes as \xNN.
 void PrintSignature(std::string_view signature) {
    for (char ch : signature) {
       unsigned char c = static_cast<unsigned char>(ch);
-      if (std::isprint(c) && c != '\\')
+      if (c >= 0x20 && c <= 0x7e && c != '\\')
          std::fputc(c, stderr);
       else
          std::fprintf(stderr, "\\x%02x", c);
@@ -112,6 +106,7 @@ bool WriteAll(int fd, const uint8_t *data, size_t length) {
 // Starts the table's file from its first buffer record: names it after the
 // signature and opens it.  False after reporting a failure.
 bool OpenTableFile(uint8_t *record, int32_t table, SignatureCounter *counter, FileCloser *file) {
+   using namespace acpibuffer;
    record[kSignatureEnd] = 0;
    std::string_view signature = ReadText(record, kSignature, kSignatureEnd - kSignature);
    if (!SafeSignature(signature)) {
@@ -139,12 +134,12 @@ bool OpenTableFile(uint8_t *record, int32_t table, SignatureCounter *counter, Fi
 // The table key is on the key list.  False on any failure.
 bool DumpTable(KEL_ParamList *keys, int32_t table, uint32_t count, uint8_t *record,
                SignatureCounter *counter) {
+   using namespace acpibuffer;
    FileCloser file;
    for (uint32_t j = 0; j < count; j++) {
-      if (KEL_ParamListAddInt(keys, j) != KEL_STATUS_OK) return false;
-      KEL_Status status = KEL_Get(KEL_NODE_hardware_acpi_tables_buffers, keys, record, kRecordSize);
-      KEL_ParamListRemoveLastParam(keys);
-      if (status != KEL_STATUS_OK) return false;
+      ScopedKey bufferKey(keys, uint64_t(j));
+      if (!bufferKey.ok()) return false;
+      if (KEL_Get(KEL_NODE_hardware_acpi_tables_buffers, keys, record, kSize) != KEL_STATUS_OK) return false;
 
       uint32_t length = ReadU32(record, kLength);
       if (length > kDataMax) {
@@ -170,13 +165,15 @@ int AmldumpMain(int, char **) {
    if (!keys) return 1;
 
    // One record buffer serves every read of the run.
-   static uint8_t record[kRecordSize];
+   static uint8_t record[acpibuffer::kSize];
    SignatureCounter counter;
    for (uint32_t i = 0; i < numTables; i++) {
+      // A key that is no 32-bit number fails here, and so does the run.
       int32_t table;
       if (KEL_ParamListGetInt32(tables.get(), i, &table) != KEL_STATUS_OK) return 1;
       // The key goes back sign-extended to 64 bits.
-      if (KEL_ParamListAddInt(keys.get(), uint64_t(int64_t(table))) != KEL_STATUS_OK) return 1;
+      ScopedKey tableKey(keys.get(), uint64_t(int64_t(table)));
+      if (!tableKey.ok()) return 1;
 
       // Only the number of buffers counts; they are read by index 0..m-1.
       ParamListPtr buffers;
@@ -186,7 +183,6 @@ int AmldumpMain(int, char **) {
       buffers.reset();
 
       if (numBuffers > 0 && !DumpTable(keys.get(), table, numBuffers, record, &counter)) return 1;
-      KEL_ParamListRemoveLastParam(keys.get());
    }
    return 0;
 }

@@ -14,19 +14,33 @@ constexpr const char kUsage[] = "irqinfo:      List interrupt information\n";
 
 // CPU information record (KEL_NODE_hardware_cpu_cpuInfo, 36 bytes):
 //   16 number of physical CPUs  u32
-constexpr uint32_t kCpuInfoSize = 36;
+namespace cpuinfo {
+constexpr uint32_t kSize = 36;
 constexpr size_t kNumCpus = 16;
+}  // namespace cpuinfo
+static_assert(cpuinfo::kSize == KEL_RECORD_SIZE_hardware_cpu_cpuInfo);
 
 // Interrupt usage record (KEL_NODE_hardware_interrupts_cookieList_UsageStatus,
 // 12 bytes):
 //    8 device flag  u8   zero: the kernel's own device, shown as "<ORX device>"
-constexpr uint32_t kUsageSize = 12;
+namespace irqusage {
+constexpr uint32_t kSize = 12;
 constexpr size_t kDeviceFlag = 8;
+}  // namespace irqusage
+static_assert(irqusage::kSize == KEL_RECORD_SIZE_hardware_interrupts_cookieList_UsageStatus);
 
 // Per-CPU count record (KEL_NODE_hardware_interrupts_cookieList_PCPU, 8 bytes):
 //    0 interrupts on that CPU  u64
-constexpr uint32_t kCountSize = 8;
+namespace irqcount {
+constexpr uint32_t kSize = 8;
 constexpr size_t kCount = 0;
+}  // namespace irqcount
+static_assert(irqcount::kSize == KEL_RECORD_SIZE_hardware_interrupts_cookieList_PCPU);
+
+// The most CPUs the table has columns for.  A tree that claims more is
+// refused before anything is printed, so that a hostile count cannot keep
+// the command reading counts for hours.
+constexpr uint32_t kMaxCpus = 4096;
 
 // The devices column: a 64-byte buffer, so at most 63 characters.
 constexpr size_t kDevicesMax = 63;
@@ -61,16 +75,14 @@ void JoinDevices(const KEL_ParamList *devices, DevicesText *out) {
 // than a count takes, so the row's later columns shift left: kept as the
 // tool has always printed it).  False when the CPU index cannot be added.
 bool PrintCpuCount(KEL_ParamList *keys, uint32_t cpu) {
-   KEL_Status status = KEL_ParamListAddInt(keys, cpu);
-   if (status != KEL_STATUS_OK) {
-      std::fprintf(stderr, "Couldn't add param to list: %#x", status);
+   ScopedKey cpuKey(keys, uint64_t(cpu));
+   if (!cpuKey.ok()) {
+      std::fprintf(stderr, "Couldn't add param to list: %#x", cpuKey.status());
       return false;
    }
-   uint8_t record[kCountSize];
-   status = KEL_Get(KEL_NODE_hardware_interrupts_cookieList_PCPU, keys, record, sizeof record);
-   KEL_ParamListRemoveLastParam(keys);
-   if (status == KEL_STATUS_OK)
-      std::printf("%10llu ", static_cast<unsigned long long>(ReadU64(record, kCount)));
+   uint8_t record[irqcount::kSize];
+   if (KEL_Get(KEL_NODE_hardware_interrupts_cookieList_PCPU, keys, record, sizeof record) == KEL_STATUS_OK)
+      std::printf("%10llu ", static_cast<unsigned long long>(ReadU64(record, irqcount::kCount)));
    else
       std::printf("%10s", "");
    return true;
@@ -79,13 +91,14 @@ bool PrintCpuCount(KEL_ParamList *keys, uint32_t cpu) {
 // Prints the row of one cookie; the cookie key is on the key list meanwhile.
 // False after a failure has been reported.
 bool PrintCookieRow(const KEL_Param *cookie, KEL_ParamList *keys, uint32_t numCpus) {
-   if (!AddParamToList(cookie, keys)) {
+   ScopedKey cookieKey(keys, cookie);
+   if (!cookieKey.ok()) {
       std::fprintf(stderr, "InterruptInfo: error requesting interrupt info - 0x%x\n", 0);
       return false;
    }
    unsigned long long cookieValue = static_cast<unsigned long long>(KEL_ParamGetInt(cookie));
 
-   uint8_t usage[kUsageSize];
+   uint8_t usage[irqusage::kSize];
    if (KEL_Get(KEL_NODE_hardware_interrupts_cookieList_UsageStatus, keys, usage, sizeof usage) !=
        KEL_STATUS_OK) {
       std::fprintf(stderr, "InterruptInfo: error fetching interrupt info - 0x%llx\n", cookieValue);
@@ -105,14 +118,13 @@ bool PrintCookieRow(const KEL_Param *cookie, KEL_ParamList *keys, uint32_t numCp
 
    // The device list is read even when the flag hides it.
    DevicesText text;
-   if (ReadU8(usage, kDeviceFlag) == 0)
+   if (ReadU8(usage, irqusage::kDeviceFlag) == 0)
       text.Append("<ORX device>");
    else
       JoinDevices(devices.get(), &text);
    devices.reset();
 
    std::printf("%s\n", text.text);
-   KEL_ParamListRemoveLastParam(keys);
    return true;
 }
 
@@ -130,13 +142,17 @@ int InterruptInfo(int argc, char **) {
       return 1;
    }
 
-   uint8_t cpuInfo[kCpuInfoSize];
+   uint8_t cpuInfo[cpuinfo::kSize];
    KEL_Status status = KEL_Get(KEL_NODE_hardware_cpu_cpuInfo, nullptr, cpuInfo, sizeof cpuInfo);
    if (status != KEL_STATUS_OK) {
       std::fprintf(stderr, "InterruptInfo: error fetching number of CPUs - 0x%x\n", status);
       return 1;
    }
-   uint32_t numCpus = ReadU32(cpuInfo, kNumCpus);
+   uint32_t numCpus = ReadU32(cpuInfo, cpuinfo::kNumCpus);
+   if (numCpus > kMaxCpus) {
+      std::fprintf(stderr, "InterruptInfo: too many CPUs - %u (at most %u)\n", numCpus, kMaxCpus);
+      return 1;
+   }
 
    ParamListPtr cookies;
    status = GetInstanceList(KEL_NODE_hardware_interrupts_cookieList, nullptr, &cookies);

@@ -4,9 +4,7 @@
 #include <getopt.h>
 
 #include <cstdio>
-#include <cstdlib>
 #include <cstring>
-#include <memory>
 #include <string_view>
 
 #include "keltools.h"
@@ -46,14 +44,17 @@ constexpr char kDetailedHeader[] = "%-12s %-19s %-14s %-1s %-12s %-8s\n";
 // The walk's levels are kPciLevels; the key list holds one key per level.
 constexpr int kFunctionLevel = 4;
 
-// Module record (KEL_NODE_system_modules_general, 700 bytes): the name at 0
-// (only its first 32 bytes are used) and the module ID, u32, at 288.
+// Module record (KEL_NODE_system_modules_general, 700 bytes):
+//
+//      0 name       text (only its first 32 bytes are used)
+//    288 module ID  u32
 namespace modulerecord {
 constexpr uint32_t kSize = 700;
 constexpr size_t kName = 0;
 constexpr size_t kNameWidth = 32;
 constexpr size_t kId = 288;
 }  // namespace modulerecord
+static_assert(modulerecord::kSize == KEL_RECORD_SIZE_system_modules_general);
 constexpr uint32_t kNoModule = 0xffffffff;
 
 struct ModuleEntry {
@@ -61,14 +62,10 @@ struct ModuleEntry {
    char name[modulerecord::kNameWidth + 1];
 };
 
-struct FreeDeleter {
-   void operator()(void *p) const { std::free(p); }
-};
-
 // The module table: one entry per kernel module, closed by an entry with
 // ID kNoModule.  Built at the first line that needs a module name and kept
 // for the rest of the run; after a failure the next such line tries again.
-using ModuleTable = std::unique_ptr<ModuleEntry[], FreeDeleter>;
+using ModuleTable = MallocPtr<ModuleEntry>;
 
 // Reads every module's ID and name.  Null after a failure, which it reports.
 ModuleTable ListModules() {
@@ -77,33 +74,46 @@ ModuleTable ListModules() {
       std::fputs("ListModules: Not enough memory\n", stderr);
       return nullptr;
    }
-   ParamListPtr list;
-   KEL_Status status = GetInstanceList(KEL_NODE_system_modules, nullptr, &list);
-   if (status != KEL_STATUS_OK) {
-      std::fprintf(stderr, "ListModules: error fetching orvik module list - 0x%x\n", status);
-      return nullptr;
-   }
-   uint32_t count = KEL_ParamListUsedCount(list.get());
-   ModuleTable table(static_cast<ModuleEntry *>(std::calloc(size_t(count) + 1, sizeof(ModuleEntry))));
-   if (!table) {
-      std::fputs("ListModules: Not enough memory\n", stderr);
-      return nullptr;
-   }
-   for (uint32_t i = 0; i < count; i++) {
-      if (!AddParamToList(KEL_ParamListGetParam(list.get(), i), keys.get())) {
-         std::fprintf(stderr, "ListModules: error requesting module info - 0x%x\n", 0);
-         return nullptr;
+   ModuleTable table;
+   size_t capacity = 0;
+   size_t count = 0;
+   bool noMemory = false;
+   KEL_Status status = KEL_STATUS_OK;
+   WalkResult walk = ForEachInstance(KEL_NODE_system_modules, keys.get(), [&](const KEL_Param *) {
+      // Room for this module and the closing entry.
+      if (!GrowArray(&table, &capacity, count + 2)) {
+         noMemory = true;
+         return false;
       }
       uint8_t rec[modulerecord::kSize];
       status = KEL_Get(KEL_NODE_system_modules_general, keys.get(), rec, sizeof rec);
-      if (status != KEL_STATUS_OK) {
-         std::fprintf(stderr, "ListModules: error fetching module info - 0x%x\n", status);
-         return nullptr;
-      }
-      table[i].id = ReadU32(rec, modulerecord::kId);
+      if (status != KEL_STATUS_OK) return false;
+      table[count].id = ReadU32(rec, modulerecord::kId);
       std::string_view name = ReadText(rec, modulerecord::kName, modulerecord::kNameWidth);
-      std::memcpy(table[i].name, name.data(), name.size());
-      KEL_ParamListRemoveLastParam(keys.get());
+      std::memcpy(table[count].name, name.data(), name.size());
+      count++;
+      return true;
+   });
+   switch (walk.end) {
+   case WalkEnd::ListFailed:
+      std::fprintf(stderr, "ListModules: error fetching orvik module list - 0x%x\n", walk.status);
+      return nullptr;
+   case WalkEnd::AppendFailed:
+      std::fprintf(stderr, "ListModules: error requesting module info - 0x%x\n", 0);
+      return nullptr;
+   case WalkEnd::Stopped:
+      if (noMemory)
+         std::fputs("ListModules: Not enough memory\n", stderr);
+      else
+         std::fprintf(stderr, "ListModules: error fetching module info - 0x%x\n", status);
+      return nullptr;
+   case WalkEnd::Done:
+      break;
+   }
+   // With no modules the table is the closing entry alone.
+   if (!GrowArray(&table, &capacity, count + 1)) {
+      std::fputs("ListModules: Not enough memory\n", stderr);
+      return nullptr;
    }
    table[count].id = kNoModule;
    return table;
@@ -122,18 +132,22 @@ const char *ModuleName(ModuleTable &modules, uint32_t id) {
 // Sixteen bytes a line, each line led by the offset of its first byte:
 // "%02x:" for the offset, " %02x" for each byte.  A line is formatted whole
 // and written at once; the bytes are the same as byte-by-byte printing.
-void HexDump(const uint8_t *bytes, size_t length) {
+// Both configuration spaces are whole lines.
+constexpr size_t kDumpLine = 16;
+
+template <size_t N>
+void HexDump(const uint8_t (&bytes)[N]) {
+   static_assert(N % kDumpLine == 0);
    static constexpr char kHex[] = "0123456789abcdef";
-   for (size_t row = 0; row < length; row += 16) {
-      char line[16 + 16 * 3 + 2];
+   for (size_t row = 0; row < N; row += kDumpLine) {
+      char line[16 + kDumpLine * 3 + 2];
       int n = std::snprintf(line, sizeof line, "%02x:", unsigned(row));
-      size_t end = length - row < 16 ? length : row + 16;
-      for (size_t i = row; i < end; i++) {
+      for (size_t i = row; i < row + kDumpLine; i++) {
          line[n++] = ' ';
          line[n++] = kHex[bytes[i] >> 4];
          line[n++] = kHex[bytes[i] & 15];
       }
-      if (end - row == 16) line[n++] = '\n';
+      line[n++] = '\n';
       std::fwrite(line, 1, size_t(n), stdout);
    }
 }
@@ -162,8 +176,8 @@ struct Walk {
    KEL_ParamList *keys;  // segment, bus, slot, function of the current function
    ModuleTable modules;
    uint8_t rec[pcirecord::kSize];
-   uint8_t config[kPciConfigSpaceSize];
-   uint8_t extConfig[kPciExtConfigSpaceSize];
+   uint8_t config[pciconfigspace::kSize];
+   uint8_t extConfig[pciextconfigspace::kSize];
 };
 
 uint32_t KeyAt(const KEL_ParamList *keys, uint32_t index) {
@@ -228,8 +242,8 @@ void PrintDefault(const Walk &w) {
       std::putchar('\n');
    if ((w.flags & kVerbose) && !(w.flags & kNoLookup))
       std::printf("\t Class %.4x: %04x:%04x\n\n", f.classCode, f.vendor, f.device);
-   if (w.flags & kDump) HexDump(w.config, sizeof w.config);
-   if (w.flags & kExtDump) HexDump(w.extConfig, sizeof w.extConfig);
+   if (w.flags & kDump) HexDump(w.config);
+   if (w.flags & kExtDump) HexDump(w.extConfig);
 }
 
 void PrintDetailed(Walk &w) {
@@ -294,46 +308,52 @@ int ShowFunction(Walk &w) {
 // every level.
 int WalkLevel(Walk &w, int level) {
    if (level == kFunctionLevel) return ShowFunction(w);
-   ParamListPtr list;
-   KEL_Status status = GetInstanceList(*kPciLevels[level].node, level == 0 ? nullptr : w.keys, &list);
-   if (status != KEL_STATUS_OK) {
-      std::fprintf(stderr, "ListPCI: error fetching PCI %s list 0x%x\n", kPciLevels[level].name, status);
+   int result = 0;
+   WalkResult walk = ForEachInstance(*kPciLevels[level].node, w.keys, [&](const KEL_Param *) {
+      result = WalkLevel(w, level + 1);
+      return result == 0;
+   });
+   switch (walk.end) {
+   case WalkEnd::ListFailed:
+      std::fprintf(stderr, "ListPCI: error fetching PCI %s list 0x%x\n", kPciLevels[level].name, walk.status);
       return 1;
-   }
-   uint32_t count = KEL_ParamListUsedCount(list.get());
-   for (uint32_t i = 0; i < count; i++) {
-      if (!AddParamToList(KEL_ParamListGetParam(list.get(), i), w.keys)) return 1;
-      int result = WalkLevel(w, level + 1);
-      KEL_ParamListRemoveLastParam(w.keys);
-      if (result != 0) return result;
+   case WalkEnd::AppendFailed:
+      return 1;  // AddParamToList has reported it
+   case WalkEnd::Stopped:
+      return result;
+   case WalkEnd::Done:
+      break;
    }
    return 0;
 }
 
-unsigned ParseOptions(int argc, char **argv) {
-   unsigned flags = 0;
+// Sets the option flags; false after printing the usage for -h or an
+// option lspci does not know.
+bool ParseOptions(int argc, char **argv, unsigned *flags) {
    int c;
    while ((c = getopt_long(argc, argv, kShortOptions, kLongOptions, nullptr)) != -1) {
       switch (c) {
-      case 'p': flags |= kDetailed; break;
-      case 'n': flags |= kNoLookup; break;
-      case 'd': flags |= kDump; break;
-      case 'e': flags |= kExtDump; break;
-      case 'v': flags |= kVerbose; break;
-      default:
-         std::fputs(kUsage, stderr);
-         std::exit(1);
+      case 'p': *flags |= kDetailed; break;
+      case 'n': *flags |= kNoLookup; break;
+      case 'd': *flags |= kDump; break;
+      case 'e': *flags |= kExtDump; break;
+      case 'v': *flags |= kVerbose; break;
+      default: std::fputs(kUsage, stderr); return false;
       }
    }
-   return flags;
+   return true;
 }
 
 }  // namespace
 
 int ListPCI(int argc, char **argv) {
-   unsigned flags = ParseOptions(argc, argv);
+   // -h, like any option lspci does not know, ends the command with 1.
+   unsigned flags = 0;
+   if (!ParseOptions(argc, argv, &flags)) return 1;
    // The names are loaded whatever the options, as they always have been.
-   LoadPciIdTables();
+   // Only a corrupted ID file name or no memory for the file list ends the
+   // command here; any other failure only takes the names away.
+   if (!LoadPciIdTables()) return 1;
    if (flags & kDetailed) {
       std::printf(kDetailedHeader, "Segm:Bu:De.F", "Vend:Dvid Subv:Subd", "ISA/irq/Vect P", "M", "Module", "Name");
       std::printf(kDetailedHeader, "", "", "Spawned bus", "", "", "");

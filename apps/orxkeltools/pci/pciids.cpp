@@ -30,6 +30,9 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <memory>
+
+#include "keltools.h"
 
 extern "C" const char not_avail_prefix[] = "Name not available for ";
 
@@ -56,6 +59,30 @@ constexpr size_t kClassNameCap = 64;
 constexpr uint8_t kMadeUp = 1;     // in the store of synthesized names, not in a file
 constexpr uint8_t kNotAvail = 2;   // begins with not_avail_prefix
 
+// Memory mapped by MapZeroed or from a file; its owner unmaps it.
+struct Unmapper {
+   size_t bytes = 0;
+   void operator()(const void *p) const { munmap(const_cast<void *>(p), bytes); }
+};
+template <class T>
+using MappedArray = std::unique_ptr<T[], Unmapper>;
+
+// count zero-filled elements whose pages are all mapped by one call.
+// Taking them one page fault at a time costs several times as much on the
+// machines measured.  A count of 0 gives an empty owner and counts as
+// success.
+template <class T>
+bool MapZeroed(size_t count, MappedArray<T> *array) {
+   array->reset();
+   if (count == 0) return true;
+   if (count > SIZE_MAX / sizeof(T)) return false;
+   size_t bytes = count * sizeof(T);
+   void *p = mmap(nullptr, bytes, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS | MAP_POPULATE, -1, 0);
+   if (p == MAP_FAILED) return false;
+   *array = MappedArray<T>(static_cast<T *>(p), Unmapper{bytes});
+   return true;
+}
+
 // The bytes of one ID file for the tables' lifetime: mapped from the file,
 // or, for a file that cannot be mapped, read into memory.  Offsets of names
 // run over all files end to end; base is where this one starts.
@@ -66,17 +93,71 @@ struct Source {
    bool mapped;
 };
 
-// The tables of the last load.  Both counts are 0 when there are none.
+// The sources of one load.  It owns their bytes: a mapping is unmapped and
+// memory read from a file freed when the table is cleared or replaced.
+class SourceTable {
+public:
+   SourceTable() = default;
+   SourceTable(const SourceTable &) = delete;
+   SourceTable &operator=(const SourceTable &) = delete;
+   SourceTable &operator=(SourceTable &&other) noexcept {
+      if (this != &other) {
+         Release();
+         rows_ = std::move(other.rows_);
+         capacity_ = other.capacity_;
+         count_ = other.count_;
+         end_ = other.end_;
+         other.capacity_ = 0;
+         other.count_ = 0;
+         other.end_ = 0;
+      }
+      return *this;
+   }
+   ~SourceTable() { Release(); }
+
+   // Takes over a file's bytes as the next source; false (and the bytes
+   // left to the caller) when the offsets would pass 4 GiB or there is no
+   // memory.
+   bool Add(const char *bytes, size_t size, bool mapped, int *index) {
+      if (size > UINT32_MAX - end_) return false;
+      if (!GrowArray(&rows_, &capacity_, size_t(count_) + 1)) return false;
+      rows_[count_] = Source{bytes, size, end_, mapped};
+      end_ += uint32_t(size);
+      *index = count_++;
+      return true;
+   }
+
+   int Count() const { return count_; }
+   const Source &operator[](int index) const { return rows_[index]; }
+
+private:
+   void Release() {
+      for (int i = 0; i < count_; i++) {
+         const Source &s = rows_[i];
+         if (s.mapped)
+            munmap(const_cast<char *>(s.bytes), s.size);
+         else
+            std::free(const_cast<char *>(s.bytes));
+      }
+      count_ = 0;
+   }
+
+   MallocPtr<Source> rows_;
+   size_t capacity_ = 0;
+   int count_ = 0;
+   uint32_t end_ = 0;  // offset after the last source's bytes
+};
+
+// The tables of the last load, each held by its owner.  Both counts are 0
+// when there are none.
 struct Tables {
-   Source *sources = nullptr;
-   int sourceCount = 0;
-   uint32_t sourceEnd = 0;  // offset after the last source's bytes
-   char *madeUp = nullptr;  // synthesized names
+   SourceTable sources;
+   MallocPtr<char> madeUp;  // synthesized names
    size_t madeUpSize = 0;
    size_t madeUpCapacity = 0;
-   PciDevEntry *dev = nullptr;
+   MappedArray<PciDevEntry> dev;
    int ndevid = 0;
-   PciClassEntry *cls = nullptr;
+   MappedArray<PciClassEntry> cls;
    int nclass = 0;
    int lastOverrideIndex = -1;
    int keyRuns = 0;  // runs of rows with one (vendor, device): at least the number of pairs
@@ -84,78 +165,29 @@ struct Tables {
    // holding the first row of its pair, and for each row the next row of
    // the same pair in table order.  Both hold row + 1, so that 0 is none.
    bool indexTried = false;
-   int32_t *slots = nullptr;
+   MappedArray<int32_t> slots;
    uint32_t slotCount = 0;  // a power of two
    int slotShift = 0;       // 32 - log2(slotCount): the hash keeps the top bits
-   int32_t *next = nullptr;
+   MappedArray<int32_t> next;
 };
 
 Tables gIds;
 
-// Zero-filled memory whose pages are all mapped by one call.  Taking them
-// one page fault at a time costs several times as much on the machines
-// measured.  A size of 0 gives no memory and counts as success.
-void *MapZeroed(size_t bytes, bool *ok) {
-   *ok = true;
-   if (bytes == 0) return nullptr;
-   void *p = mmap(nullptr, bytes, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS | MAP_POPULATE, -1, 0);
-   if (p != MAP_FAILED) return p;
-   *ok = false;
-   return nullptr;
-}
-
-void Unmap(const void *p, size_t bytes) {
-   if (p != nullptr) munmap(const_cast<void *>(p), bytes);
-}
-
 void DropIndex() {
-   Unmap(gIds.slots, gIds.slotCount * sizeof(int32_t));
-   Unmap(gIds.next, size_t(gIds.ndevid) * sizeof(int32_t));
-   gIds.slots = nullptr;
-   gIds.next = nullptr;
+   gIds.slots.reset();
+   gIds.next.reset();
    gIds.slotCount = 0;
    gIds.indexTried = false;
 }
 
-void DropTables() {
-   DropIndex();
-   Unmap(gIds.dev, size_t(gIds.ndevid) * sizeof(PciDevEntry));
-   Unmap(gIds.cls, size_t(gIds.nclass) * sizeof(PciClassEntry));
-   for (int i = 0; i < gIds.sourceCount; i++) {
-      const Source &s = gIds.sources[i];
-      if (s.mapped)
-         Unmap(s.bytes, s.size);
-      else
-         std::free(const_cast<char *>(s.bytes));
-   }
-   std::free(gIds.sources);
-   std::free(gIds.madeUp);
-   gIds = Tables{};
-}
+void DropTables() { gIds = Tables{}; }
 
-// Adds a file's bytes to the sources; false (and nothing kept) when the
-// offsets would pass 4 GiB or there is no memory.
-bool AddSource(const char *bytes, size_t size, bool mapped, int *index) {
-   if (size > UINT32_MAX - gIds.sourceEnd) return false;
-   auto *grown = static_cast<Source *>(std::realloc(gIds.sources, (gIds.sourceCount + 1) * sizeof(Source)));
-   if (grown == nullptr) return false;
-   gIds.sources = grown;
-   gIds.sources[gIds.sourceCount] = Source{bytes, size, gIds.sourceEnd, mapped};
-   gIds.sourceEnd += uint32_t(size);
-   *index = gIds.sourceCount++;
-   return true;
-}
-
+// Keeps a synthesized name; false when there is no memory or its offset
+// would pass 4 GiB.
 bool StoreMadeUpName(std::string_view name, PciText *text) {
-   if (gIds.madeUpCapacity - gIds.madeUpSize < name.size()) {
-      size_t capacity = gIds.madeUpCapacity ? 2 * gIds.madeUpCapacity : 4096;
-      if (capacity > UINT32_MAX) return false;
-      char *grown = static_cast<char *>(std::realloc(gIds.madeUp, capacity));
-      if (grown == nullptr) return false;
-      gIds.madeUp = grown;
-      gIds.madeUpCapacity = capacity;
-   }
-   std::memcpy(gIds.madeUp + gIds.madeUpSize, name.data(), name.size());
+   if (name.size() > UINT32_MAX - gIds.madeUpSize) return false;
+   if (!GrowArray(&gIds.madeUp, &gIds.madeUpCapacity, gIds.madeUpSize + name.size())) return false;
+   std::memcpy(gIds.madeUp.get() + gIds.madeUpSize, name.data(), name.size());
    *text = PciText{uint32_t(gIds.madeUpSize), uint8_t(name.size()), kMadeUp | kNotAvail};
    gIds.madeUpSize += name.size();
    return true;
@@ -163,18 +195,12 @@ bool StoreMadeUpName(std::string_view name, PciText *text) {
 
 // Reads what is left of a descriptor into memory; what was read before an
 // error is kept, as end of file would.
-char *ReadAll(int fd, size_t *size) {
-   char *bytes = nullptr;
+MallocPtr<char> ReadAll(int fd, size_t *size) {
+   MallocPtr<char> bytes;
    size_t used = 0, capacity = 0;
    for (;;) {
-      if (used == capacity) {
-         size_t grow = capacity ? 2 * capacity : kReadChunk;
-         char *grown = static_cast<char *>(std::realloc(bytes, grow));
-         if (grown == nullptr) break;
-         bytes = grown;
-         capacity = grow;
-      }
-      ssize_t n = read(fd, bytes + used, capacity - used);
+      if (used == capacity && !GrowArray(&bytes, &capacity, used + kReadChunk)) break;
+      ssize_t n = read(fd, bytes.get() + used, capacity - used);
       if (n < 0 && errno == EINTR) continue;
       if (n <= 0) break;
       used += size_t(n);
@@ -183,14 +209,16 @@ char *ReadAll(int fd, size_t *size) {
    return bytes;
 }
 
-[[noreturn]] void CorruptedFileName() {
+// The two problems that end lspci: both are reported here, and the load
+// then fails all the way up.
+bool CorruptedFileName() {
    std::fputs("Found corrupted file name\n", stderr);
-   std::exit(1);
+   return false;
 }
 
-[[noreturn]] void NoMemoryForFileList() {
+bool NoMemoryForFileList() {
    std::fputs("Not enough memory for file list\n", stderr);
-   std::exit(1);
+   return false;
 }
 
 // One entry of the file list.  A file is opened when the cursor first
@@ -208,52 +236,50 @@ struct IdFile {
 // The ID files of one load in reading order, with a cursor over their lines.
 class FileList {
 public:
-   FileList() {
-      files_ = static_cast<IdFile *>(std::malloc(capacity_ * sizeof(IdFile)));
-      buffer_ = static_cast<char *>(std::malloc(kReadChunk));
-      if (files_ == nullptr || buffer_ == nullptr) NoMemoryForFileList();
-   }
+   FileList() = default;
    ~FileList() {
       for (int i = 0; i < count_; i++) {
          if (files_[i].fd >= 0) close(files_[i].fd);
          std::free(files_[i].path);
       }
-      std::free(files_);
-      std::free(buffer_);
    }
    FileList(const FileList &) = delete;
    FileList &operator=(const FileList &) = delete;
 
-   void Add(const char *path) {
+   // Takes the read buffer; false after reporting that there is no memory.
+   bool Init() {
+      buffer_ = AllocArray<char>(kReadChunk);
+      return buffer_ ? true : NoMemoryForFileList();
+   }
+
+   // False after reporting a path that is too long or no memory.
+   bool Add(const char *path) {
       size_t len = std::strlen(path);
-      if (len > kMaxFileName) CorruptedFileName();
-      if (count_ == capacity_) {
-         auto *grown = static_cast<IdFile *>(std::realloc(files_, 2 * capacity_ * sizeof(IdFile)));
-         if (grown == nullptr) NoMemoryForFileList();
-         files_ = grown;
-         capacity_ *= 2;
-      }
+      if (len > kMaxFileName) return CorruptedFileName();
+      if (!GrowArray(&files_, &capacity_, size_t(count_) + 1)) return NoMemoryForFileList();
       char *copy = static_cast<char *>(std::malloc(len + 1));
-      if (copy == nullptr) NoMemoryForFileList();
+      if (copy == nullptr) return NoMemoryForFileList();
       std::memcpy(copy, path, len + 1);
       files_[count_++] = IdFile{copy, false, -1, -1};
+      return true;
    }
 
    // Adds the files of dir whose names end in ".ids", in the order the
-   // folder lists them.  A folder that cannot be opened adds nothing.
-   void AddDirectory(const char *dir) {
-      DIR *d = opendir(dir);
-      if (d == nullptr) return;
-      while (const dirent *entry = readdir(d)) {
+   // folder lists them.  A folder that cannot be opened adds nothing.  False
+   // after reporting a name or path that is too long, or no memory.
+   bool AddDirectory(const char *dir) {
+      std::unique_ptr<DIR, int (*)(DIR *)> d(opendir(dir), closedir);
+      if (d == nullptr) return true;
+      while (const dirent *entry = readdir(d.get())) {
          size_t len = strnlen(entry->d_name, kMaxFileName + 1);
-         if (len > kMaxFileName) CorruptedFileName();
+         if (len > kMaxFileName) return CorruptedFileName();
          if (len <= 4 || std::memcmp(entry->d_name + len - 4, ".ids", 4) != 0) continue;
          char path[kMaxPathBuf];
          int n = std::snprintf(path, sizeof path, "%s/%s", dir, entry->d_name);
-         if (n < 0 || size_t(n) >= sizeof path) CorruptedFileName();
-         Add(path);
+         if (n < 0 || size_t(n) >= sizeof path) return CorruptedFileName();
+         if (!Add(path)) return false;
       }
-      closedir(d);
+      return true;
    }
 
    // The next line (piece) across all files, cut at its first NUL as a C
@@ -325,7 +351,7 @@ private:
          // A mapped file is read through the buffer; its mapping is touched
          // only where a name is printed.
          if (lseek(f.fd, 0, SEEK_SET) != 0) return false;
-         data_ = buffer_;
+         data_ = buffer_.get();
          length_ = 0;
          unread_ = s.size;
       }
@@ -342,7 +368,7 @@ private:
          size_t size = size_t(st.st_size);
          void *map = mmap(nullptr, size, PROT_READ, MAP_PRIVATE, fd, 0);
          if (map != MAP_FAILED) {
-            if (AddSource(static_cast<const char *>(map), size, true, &f.source)) {
+            if (gIds.sources.Add(static_cast<const char *>(map), size, true, &f.source)) {
                f.fd = fd;
                return;
             }
@@ -350,23 +376,23 @@ private:
          }
       }
       size_t size;
-      char *bytes = ReadAll(fd, &size);
+      MallocPtr<char> bytes = ReadAll(fd, &size);
       close(fd);
-      if (size == 0 || !AddSource(bytes, size, false, &f.source)) std::free(bytes);
+      if (size > 0 && gIds.sources.Add(bytes.get(), size, false, &f.source)) (void)bytes.release();
    }
 
    // Keeps at least one whole piece ahead in the buffer while the file has
    // bytes left to read.  Reads stop at the size the file was mapped with.
    void Refill() {
       if (unread_ == 0) return;
-      std::memmove(buffer_, buffer_ + pos_, length_ - pos_);
+      std::memmove(buffer_.get(), buffer_.get() + pos_, length_ - pos_);
       offset_ += pos_;
       length_ -= pos_;
       pos_ = 0;
       int fd = files_[current_].fd;
       while (length_ < kLinePiece && unread_ > 0) {
          size_t want = kReadChunk - length_ < unread_ ? kReadChunk - length_ : unread_;
-         ssize_t n = read(fd, buffer_ + length_, want);
+         ssize_t n = read(fd, buffer_.get() + length_, want);
          if (n < 0 && errno == EINTR) continue;
          if (n <= 0) {
             unread_ = 0;
@@ -375,7 +401,7 @@ private:
          length_ += size_t(n);
          unread_ -= size_t(n);
       }
-      firstNul_ = static_cast<const char *>(std::memchr(buffer_, '\0', length_));
+      firstNul_ = static_cast<const char *>(std::memchr(buffer_.get(), '\0', length_));
    }
 
    void NextFile() {
@@ -384,10 +410,10 @@ private:
       lineNumber_ = 0;
    }
 
-   IdFile *files_ = nullptr;
+   MallocPtr<IdFile> files_;
    int count_ = 0;
-   int capacity_ = 8;
-   char *buffer_ = nullptr;
+   size_t capacity_ = 0;
+   MallocPtr<char> buffer_;  // kReadChunk bytes
    // The cursor: the file, its line number, and its bytes at hand: data_
    // holds length_ bytes from file offset offset_, pos_ is the next one.
    int current_ = 0;
@@ -703,12 +729,9 @@ void BuildDeviceIndex() {
       count *= 2;
       shift--;
    }
-   bool slotsOk, nextOk;
-   gIds.slots = static_cast<int32_t *>(MapZeroed(count * sizeof(int32_t), &slotsOk));
    gIds.slotCount = count;
    gIds.slotShift = shift;
-   gIds.next = static_cast<int32_t *>(MapZeroed(size_t(gIds.ndevid) * sizeof(int32_t), &nextOk));
-   if (!slotsOk || !nextOk) {
+   if (!MapZeroed(count, &gIds.slots) || !MapZeroed(size_t(gIds.ndevid), &gIds.next)) {
       DropIndex();
       gIds.indexTried = true;
       return;
@@ -726,8 +749,8 @@ void BuildDeviceIndex() {
 
 std::string_view PciName(PciText text) {
    if (text.len == 0) return {};
-   if (text.flags & kMadeUp) return std::string_view(gIds.madeUp + text.at, text.len);
-   for (int i = gIds.sourceCount - 1; i >= 0; i--) {
+   if (text.flags & kMadeUp) return std::string_view(gIds.madeUp.get() + text.at, text.len);
+   for (int i = gIds.sources.Count() - 1; i >= 0; i--) {
       const Source &s = gIds.sources[i];
       if (text.at >= s.base) return std::string_view(s.bytes + (text.at - s.base), text.len);
    }
@@ -757,19 +780,20 @@ bool ParsePciIdLine(std::string_view text, size_t nameCapacity, PciIdField *fiel
    return true;
 }
 
-void LoadPciIdTables() { LoadPciIdTablesFrom(kPciIdsRoot); }
+bool LoadPciIdTables() { return LoadPciIdTablesFrom(kPciIdsRoot); }
 
-void LoadPciIdTablesFrom(const char *root) {
+bool LoadPciIdTablesFrom(const char *root) {
    DropTables();
    FileList files;
+   if (!files.Init()) return false;
    for (const char *dir : kOverrideDirs) {
       char path[kMaxPathBuf];
       std::snprintf(path, sizeof path, "%s/%s", root, dir);
-      files.AddDirectory(path);
+      if (!files.AddDirectory(path)) return false;
    }
    char idsPath[kMaxPathBuf];
    std::snprintf(idsPath, sizeof idsPath, "%s/pci.ids", root);
-   files.Add(idsPath);
+   if (!files.Add(idsPath)) return false;
 
    int ndevid = CountDeviceRows(files);
    if (ndevid == 0) std::fputs("no device entries in the pci ids files\nPerhaps, corrupted file?\n", stderr);
@@ -777,10 +801,9 @@ void LoadPciIdTablesFrom(const char *root) {
    if (nclass == 0) std::fprintf(stderr, "no class entries in %s\nPerhaps, corrupted file?\n", idsPath);
 
    // Exact-size tables, zero-filled; an empty one is no failure.
-   bool devOk, clsOk;
-   gIds.dev = static_cast<PciDevEntry *>(MapZeroed(size_t(ndevid) * sizeof(PciDevEntry), &devOk));
+   bool devOk = MapZeroed(size_t(ndevid), &gIds.dev);
    if (devOk) gIds.ndevid = ndevid;
-   gIds.cls = static_cast<PciClassEntry *>(MapZeroed(size_t(nclass) * sizeof(PciClassEntry), &clsOk));
+   bool clsOk = MapZeroed(size_t(nclass), &gIds.cls);
    if (clsOk) gIds.nclass = nclass;
    if (!devOk)
       std::fprintf(stderr, "couldn't allocate PciDevTable (%zu bytes)\n", size_t(ndevid) * sizeof(PciDevEntry));
@@ -789,11 +812,12 @@ void LoadPciIdTablesFrom(const char *root) {
                    size_t(nclass) * sizeof(PciClassEntry));
    if (!devOk || !clsOk) {
       FailBuild();
-      return;
+      return true;
    }
 
    files.Rewind();
    if (!FillDeviceTable(files) || !FillClassTable(files)) FailBuild();
+   return true;
 }
 
 const PciDevEntry *LookupPciDevice(uint16_t vendor, uint16_t device, uint16_t subvendor,

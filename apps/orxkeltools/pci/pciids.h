@@ -49,13 +49,14 @@ struct PciClassEntry {
 std::string_view PciName(PciText text);
 
 // Builds both tables from the ID files of kPciIdsRoot.  Problems are
-// reported on standard error; only a corrupted file name or no memory for
-// the file list end the process.  A failed build leaves both tables empty.
-void LoadPciIdTables();
+// reported on standard error.  False only for a corrupted file name or no
+// memory for the file list, which end lspci with status 1; any other
+// failure leaves both tables empty and lspci goes on without names.
+bool LoadPciIdTables();
 
 // The same from another folder (for tests).  Drops the tables of an earlier
 // load first.
-void LoadPciIdTablesFrom(const char *root);
+bool LoadPciIdTablesFrom(const char *root);
 
 // The row that names this function, or null.  With device, subvendor and
 // subdevice all 0xffff it finds the vendor row.

@@ -2,6 +2,7 @@
 // PCI function, for scripts: bare numbers without newlines and raw bytes.
 #include <unistd.h>
 
+#include <cerrno>
 #include <cstdint>
 #include <cstdio>
 #include <iterator>
@@ -92,22 +93,42 @@ bool GetPCIInfo(const Address &a, uint8_t (&rec)[pcirecord::kSize]) {
                            sizeof rec);
 }
 
-// The raw bytes go out with one write to descriptor 1, past the stdio
-// buffer: text printed before them is still buffered and comes after.
-bool PrintConfigSpace(const Address &a) {
-   uint8_t space[kPciConfigSpaceSize];
-   if (!ReadFunctionNode("PrintConfigSpace", a, KEL_NODE_hardware_pci_seg_bus_slot_func_pciConfigSpace, space,
-                         sizeof space))
-      return false;
-   return write(1, space, sizeof space) == ssize_t(sizeof space);
+// Writes the raw bytes to descriptor 1, past the stdio buffer: text printed
+// before them is still buffered and comes after.  A short write goes on
+// with the rest.  False when the output failed; the error is noted for the
+// report at exit.
+bool WriteRaw(const uint8_t *bytes, size_t size) {
+   while (size > 0) {
+      ssize_t n = write(1, bytes, size);
+      if (n < 0 && errno == EINTR) continue;
+      if (n <= 0) {
+         NoteOutputError(n < 0 ? errno : EIO);
+         return false;
+      }
+      bytes += n;
+      size -= size_t(n);
+   }
+   return true;
 }
 
-bool PrintExtConfigSpace(const Address &a) {
-   uint8_t space[kPciExtConfigSpaceSize];
-   if (!ReadFunctionNode("PrintExtConfigSpace", a, KEL_NODE_hardware_pci_seg_bus_slot_func_pciExtConfigSpace,
-                         space, sizeof space))
-      return false;
-   return write(1, space, sizeof space) == ssize_t(sizeof space);
+// What PrintConfigSpace and PrintExtConfigSpace did.
+enum class Printed { Done, NotRead, OutputFailed };
+
+Printed PrintSpace(const char *who, const Address &a, KEL_Node node, uint8_t *space, uint32_t size) {
+   if (!ReadFunctionNode(who, a, node, space, size)) return Printed::NotRead;
+   return WriteRaw(space, size) ? Printed::Done : Printed::OutputFailed;
+}
+
+Printed PrintConfigSpace(const Address &a) {
+   uint8_t space[pciconfigspace::kSize];
+   return PrintSpace("PrintConfigSpace", a, KEL_NODE_hardware_pci_seg_bus_slot_func_pciConfigSpace, space,
+                     sizeof space);
+}
+
+Printed PrintExtConfigSpace(const Address &a) {
+   uint8_t space[pciextconfigspace::kSize];
+   return PrintSpace("PrintExtConfigSpace", a, KEL_NODE_hardware_pci_seg_bus_slot_func_pciExtConfigSpace,
+                     space, sizeof space);
 }
 
 }  // namespace
@@ -136,11 +157,12 @@ int PciInfoMain(int argc, char **argv) {
    }
 
    // Once an action was asked for the status is 0: a script tells a failure
-   // by the missing output.
+   // by the missing output.  Only output that cannot be written fails the
+   // command; nothing more is written then.
    uint8_t rec[pcirecord::kSize];
    if ((actions & kPrintIrq) && GetPCIInfo(a, rec)) std::printf("%3d", ReadU8(rec, pcirecord::kIrq));
-   if (actions & kPrintConfig) PrintConfigSpace(a);
-   if (actions & kPrintExtConfig) PrintExtConfigSpace(a);
+   if ((actions & kPrintConfig) && PrintConfigSpace(a) == Printed::OutputFailed) return 1;
+   if ((actions & kPrintExtConfig) && PrintExtConfigSpace(a) == Printed::OutputFailed) return 1;
    if ((actions & kPrintSlot) && GetPCIInfo(a, rec)) std::printf("%3d", ReadI32(rec, pcirecord::kPhysSlot));
    return 0;
 }

@@ -55,9 +55,21 @@ constexpr size_t kPhysSlot = 56;
 constexpr uint8_t kIrqValid = 0x01;
 constexpr uint8_t kSpawnsBus = 0x02;
 }  // namespace pcirecord
+static_assert(pcirecord::kSize == KEL_RECORD_SIZE_hardware_pci_seg_bus_slot_func_pciConfigHeader);
 
-// Raw configuration spaces (pciConfigSpace and pciExtConfigSpace).
-constexpr uint32_t kPciConfigSpaceSize = 256;
-constexpr uint32_t kPciExtConfigSpaceSize = 4096;
+// Standard configuration space (KEL_NODE_hardware_pci_seg_bus_slot_func_pciConfigSpace,
+// 256 bytes): the function's raw bytes, shown as they are.
+namespace pciconfigspace {
+constexpr uint32_t kSize = 256;
+}  // namespace pciconfigspace
+static_assert(pciconfigspace::kSize == KEL_RECORD_SIZE_hardware_pci_seg_bus_slot_func_pciConfigSpace);
+
+// Extended configuration space
+// (KEL_NODE_hardware_pci_seg_bus_slot_func_pciExtConfigSpace, 4096 bytes):
+// the function's raw bytes, shown as they are.
+namespace pciextconfigspace {
+constexpr uint32_t kSize = 4096;
+}  // namespace pciextconfigspace
+static_assert(pciextconfigspace::kSize == KEL_RECORD_SIZE_hardware_pci_seg_bus_slot_func_pciExtConfigSpace);
 
 #endif
