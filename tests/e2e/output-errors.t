@@ -62,7 +62,9 @@ amldump: write error on standard output: No space left on device
 snapshot: host
 stdout: full
 run: pci-info -b 0 -s 0 -f 0 -c
-exit: 0
+exit: 1
+--- stderr
+pci-info: write error on standard output: No space left on device
 === case full: pidof
 snapshot: host
 stdout: full
@@ -141,7 +143,9 @@ pgrep: write error on standard output: Bad file descriptor
 snapshot: host
 stdout: closed
 run: pci-info -b 0 -s 0 -f 0 -c
-exit: 0
+exit: 1
+--- stderr
+pci-info: write error on standard output: Bad file descriptor
 === case closed: amldump's files do not take the place of standard output
 snapshot: host
 stdout: closed
