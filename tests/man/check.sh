@@ -13,7 +13,7 @@
 # still runs).
 set -u
 
-src=${1:-$(cd "$(dirname "$0")/../.." && pwd)}
+src=$(cd "${1:-$(dirname "$0")/../..}" && pwd)
 failures=0
 skipped=0
 
