@@ -116,18 +116,6 @@ For '.':
                           ramdisk root:            0		(    2 inodes)
                      tardisk tools.t00:            0		(    1 inodes)
                           ramdisk logs:         5000		(    1 inodes)
-=== case -d x acts as -s
-snapshot: disks
-mode: sim
-setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
-cwd: @TMP/root
-run: vdu -d x
-exit: 0
---- stdout
-For '.':
-                          ramdisk root:            0		(    2 inodes)
-                     tardisk tools.t00:            0		(    1 inodes)
-                          ramdisk logs:         5000		(    1 inodes)
 === case -d 2 leaves out the depth of the readme
 snapshot: disks
 mode: sim
@@ -220,16 +208,6 @@ setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guid
 cwd: @TMP/root
 run: vdu docs/empty
 exit: 0
-=== case an empty file as the start with -i
-snapshot: disks
-mode: sim
-setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
-cwd: @TMP/root
-run: vdu -i docs/empty
-exit: 0
---- stdout
-For 'docs/empty':
-                          ramdisk root:            0
 === case flag bit 6: an inode counted, its bytes not
 snapshot: readme-not-charged
 mode: sim
@@ -243,13 +221,6 @@ For 'docs/guide/readme':
 For 'docs/guide':
                           ramdisk root:            0		(    1 inodes)
                           ramdisk logs:            0		(    1 inodes)
-=== case a path on another device is not counted
-snapshot: disks
-mode: sim
-setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
-cwd: @TMP/root
-run: vdu -a mnt
-exit: 0
 === case "/" is not the corafs root off the host: nothing counted
 snapshot: disks
 mode: sim
@@ -474,20 +445,6 @@ run: vdu -x
 exit: 1
 --- stderr
 vdu: invalid option -- 'x'
-Gather stats about corafs
-corafsdu [filepath]
-   -h       multiple instead of bytes
-   -d depth reports for each element up to that depth (default 1)
-   -a       equivalent to unlimited depth
-   -s       equivalent to zero depth
-   -u       display stats for unlinked files
-=== case -d without its depth: usage
-snapshot: disks
-mode: sim
-run: vdu -d
-exit: 1
---- stderr
-vdu: option requires an argument -- 'd'
 Gather stats about corafs
 corafsdu [filepath]
    -h       multiple instead of bytes
