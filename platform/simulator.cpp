@@ -16,6 +16,8 @@
 #include <vector>
 
 #include "internal.h"
+#include "kel/corafsrecords.h"
+#include "kel/sysinforecords.h"
 
 namespace kelplat {
 
@@ -23,25 +25,23 @@ namespace {
 
 // --- Real-time clock -------------------------------------------------------
 // The clock lives in a file beside the snapshot ("<snapshot>.rtc", the
-// 32-byte record), so that a set is seen by the next run.
-
-constexpr uint32_t kRtcSize = 32;
+// clock's record), so that a set is seen by the next run.
 
 std::string RtcPath() { return std::string(SimulatorPath()) + ".rtc"; }
 
 bool ReadRtc(uint8_t *record) {
    int fd = open(RtcPath().c_str(), O_RDONLY | O_CLOEXEC);
    if (fd < 0) return false;
-   ssize_t n = read(fd, record, kRtcSize);
+   ssize_t n = read(fd, record, rtc::kSize);
    close(fd);
-   return n == ssize_t(kRtcSize);
+   return n == ssize_t(rtc::kSize);
 }
 
 bool WriteRtc(const uint8_t *record) {
    std::string path = RtcPath(), tmp = path + ".tmp";
    int fd = open(tmp.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0644);
    if (fd < 0) return false;
-   bool ok = write(fd, record, kRtcSize) == ssize_t(kRtcSize);
+   bool ok = write(fd, record, rtc::kSize) == ssize_t(rtc::kSize);
    ok = close(fd) == 0 && ok;
    return ok && rename(tmp.c_str(), path.c_str()) == 0;
 }
@@ -120,33 +120,91 @@ int MatchRule(const std::vector<Rule> &rules, const std::string &rel) {
    return -1;
 }
 
-// Walks the root once, recording every inode on its device.  A foreign rule
+// One directory of the index walk: where its path relative to the root
+// ends, the subdirectories still to enter, and its identity, so that the
+// way back up through ".." is checked.
+struct Level {
+   size_t relLength;
+   std::vector<std::string> subdirs;
+   size_t next;
+   dev_t dev;
+   ino_t ino;
+};
+
+// Records the entries of the directory open at dir, whose path relative to
+// the root is rel, and notes the subdirectories to enter.  A foreign rule
 // stops the walk there: what lies below stands for another file system.
+void IndexEntries(Corafs &fs, int dir, const std::string &rel, Level *level) {
+   // readdir needs a descriptor of its own; dir stays open for fstatat.
+   int own = openat(dir, ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+   if (own < 0) return;
+   DIR *d = fdopendir(own);
+   if (d == nullptr) {
+      close(own);
+      return;
+   }
+   while (struct dirent *e = readdir(d)) {
+      if (std::strcmp(e->d_name, ".") == 0 || std::strcmp(e->d_name, "..") == 0) continue;
+      struct stat st;
+      if (fstatat(dir, e->d_name, &st, AT_SYMLINK_NOFOLLOW) != 0 || st.st_dev != fs.rootDev) continue;
+      std::string childRel = rel.empty() ? std::string(e->d_name) : rel + "/" + e->d_name;
+      int rule = MatchRule(fs.rules, childRel);
+      fs.inodes.emplace(st.st_ino, SimInode{rule, uint64_t(st.st_size), e->d_name});
+      bool foreign = rule >= 0 && fs.rules[size_t(rule)].kind == RuleKind::Foreign;
+      if (S_ISDIR(st.st_mode) && !foreign) level->subdirs.emplace_back(e->d_name);
+   }
+   closedir(d);
+}
+
+// Walks the root once, recording every inode on its device.  The walk goes
+// from directory to directory by descriptor (openat, fstatat, and ".." on
+// the way back), never through a joined path, so that no depth of the tree
+// is out of reach of the system's path limit; one directory is open at a
+// time.  Should the tree change under the walk so that ".." no longer leads
+// back, the walk ends with what it has recorded.
 void Index(Corafs &fs, const std::string &root) {
+   int dir = open(root.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
    struct stat st;
-   if (lstat(root.c_str(), &st) != 0) return;
+   if (dir < 0) return;
+   if (fstat(dir, &st) != 0) {
+      close(dir);
+      return;
+   }
    fs.haveRoot = true;
    fs.rootDev = st.st_dev;
-   std::vector<std::string> pending{""};
    fs.inodes[st.st_ino] = {MatchRule(fs.rules, ""), uint64_t(st.st_size), root};
-   while (!pending.empty()) {
-      std::string rel = std::move(pending.back());
-      pending.pop_back();
-      std::string dir = rel.empty() ? root : root + "/" + rel;
-      DIR *d = opendir(dir.c_str());
-      if (d == nullptr) continue;
-      while (struct dirent *e = readdir(d)) {
-         if (std::strcmp(e->d_name, ".") == 0 || std::strcmp(e->d_name, "..") == 0) continue;
-         std::string childRel = rel.empty() ? e->d_name : rel + "/" + e->d_name;
-         std::string child = root + "/" + childRel;
-         if (lstat(child.c_str(), &st) != 0 || st.st_dev != fs.rootDev) continue;
-         int rule = MatchRule(fs.rules, childRel);
-         fs.inodes.emplace(st.st_ino, SimInode{rule, uint64_t(st.st_size), e->d_name});
-         bool foreign = rule >= 0 && fs.rules[size_t(rule)].kind == RuleKind::Foreign;
-         if (S_ISDIR(st.st_mode) && !foreign) pending.push_back(childRel);
+   std::string rel;  // the current directory's path relative to the root
+   std::vector<Level> levels;
+   levels.push_back({0, {}, 0, st.st_dev, st.st_ino});
+   IndexEntries(fs, dir, rel, &levels.back());
+   while (!levels.empty()) {
+      Level &top = levels.back();
+      if (top.next < top.subdirs.size()) {
+         const std::string &name = top.subdirs[top.next++];
+         int child = openat(dir, name.c_str(), O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC);
+         if (child < 0) continue;
+         if (fstat(child, &st) != 0 || st.st_dev != fs.rootDev) {
+            close(child);
+            continue;
+         }
+         rel.resize(top.relLength);
+         if (!rel.empty()) rel += '/';
+         rel += name;
+         close(dir);
+         dir = child;
+         levels.push_back({rel.size(), {}, 0, st.st_dev, st.st_ino});
+         IndexEntries(fs, dir, rel, &levels.back());
+         continue;
       }
-      closedir(d);
+      levels.pop_back();
+      if (levels.empty()) break;
+      int parent = openat(dir, "..", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+      close(dir);
+      dir = parent;
+      if (dir < 0) return;
+      if (fstat(dir, &st) != 0 || st.st_dev != levels.back().dev || st.st_ino != levels.back().ino) break;
    }
+   close(dir);
 }
 
 Corafs &TheCorafs() {
@@ -171,21 +229,19 @@ KEL_Status InodeStats(uint64_t ino, uint8_t *record) {
    if (it == fs.inodes.end() || it->second.rule < 0) return KEL_STATUS_NOT_FOUND;
    const Rule &rule = fs.rules[size_t(it->second.rule)];
    if (rule.kind == RuleKind::Foreign) return KEL_STATUS_NOT_FOUND;
-   // Inode stats record: flags at 4, link state at 20, size at 28, tardisk
-   // name at 32, ramdisk name at 160, file name at 288.
-   std::memset(record, 0, 544);
+   std::memset(record, 0, inodestats::kSize);
    bool tardisk = rule.kind == RuleKind::Tardisk;
-   StoreU32(record + 4, rule.flags | (tardisk ? 1u : 0u));
-   StoreU32(record + 28, uint32_t(it->second.size));
-   PutText(record, tardisk ? 32 : 160, 128, rule.disk);
-   PutText(record, 288, 256, it->second.name);
+   StoreU32(record + inodestats::kFlags, rule.flags | (tardisk ? inodestats::kOnTardisk : 0u));
+   StoreU32(record + inodestats::kSizeBytes, uint32_t(it->second.size));
+   PutText(record, tardisk ? inodestats::kTardisk : inodestats::kRamdisk, inodestats::kDiskNameWidth, rule.disk);
+   PutText(record, inodestats::kName, inodestats::kNameWidth, it->second.name);
    return KEL_STATUS_OK;
 }
 
 }  // namespace
 
 bool SimulatorClock(const NodeInfo &node, void *buf, uint32_t size, KEL_Status *status) {
-   uint8_t record[kRtcSize];
+   uint8_t record[rtc::kSize];
    if (node.number != KEL_NODE_hardware_chipset_rtc || !ReadRtc(record)) return false;
    CopyRecord({reinterpret_cast<const char *>(record), sizeof record}, buf, size);
    *status = KEL_STATUS_OK;
@@ -196,7 +252,7 @@ KEL_Status SimulatorInodeStats(const NodeInfo &node, const KEL_ParamList *keys, 
    const KEL_Param *key = KEL_ParamListGetParam(keys, 0);
    if (node.number != KEL_NODE_system_corafs_inodes_stats || key->kind == KEL_PARAM_STRING)
       return KEL_STATUS_NOT_FOUND;
-   uint8_t record[544];
+   uint8_t record[inodestats::kSize];
    KEL_Status status = InodeStats(key->value, record);
    if (status == KEL_STATUS_OK) CopyRecord({reinterpret_cast<const char *>(record), sizeof record}, buf, size);
    return status;
@@ -212,9 +268,13 @@ KEL_Status SimulatorSet(const NodeInfo &node, const KEL_ParamList *input, void *
    for (uint32_t i = 0; i < 6; i++)
       if (KEL_ParamListGetInt32(input, i, &v[i]) != KEL_STATUS_OK) return KEL_STATUS_BAD_PARAM;
    if (!ValidDateTime(v[0], v[1], v[2], v[3], v[4], v[5])) return KEL_STATUS_BAD_TIME;
-   uint8_t record[kRtcSize] = {};
-   const int32_t fields[6] = {v[3], v[4], v[5], v[1], v[0], v[2]};  // record order
-   for (int i = 0; i < 6; i++) StoreU32(record + 4 * i, uint32_t(fields[i]));
+   uint8_t record[rtc::kSize] = {};
+   StoreU32(record + rtc::kMonth, uint32_t(v[0]));
+   StoreU32(record + rtc::kDay, uint32_t(v[1]));
+   StoreU32(record + rtc::kYear, uint32_t(v[2]));
+   StoreU32(record + rtc::kHours, uint32_t(v[3]));
+   StoreU32(record + rtc::kMinutes, uint32_t(v[4]));
+   StoreU32(record + rtc::kSeconds, uint32_t(v[5]));
    return WriteRtc(record) ? KEL_STATUS_OK : KEL_STATUS_FAILURE;
 }
 

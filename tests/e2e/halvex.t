@@ -91,17 +91,10 @@ halvex: Invalid arguments
 halvex      -v, --version         Get version information for orvik
             -l, --level           Get release level information
             -h, --help            Print this menu
-=== case -h, even with -v
+=== case -h, even with -v; --help the same
 snapshot: ga
 run: halvex -v -h
-exit: 1
---- stderr
-halvex      -v, --version         Get version information for orvik
-            -l, --level           Get release level information
-            -h, --help            Print this menu
-=== case --help
-snapshot: ga
-run: halvex --help
+check: test "$(@BIN/orxkeltools -c @CACHE halvex --help 2>&1; echo $?)" = "$(@BIN/orxkeltools -c @CACHE halvex -h 2>&1; echo $?)"
 exit: 1
 --- stderr
 halvex      -v, --version         Get version information for orvik

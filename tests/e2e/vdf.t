@@ -176,12 +176,3 @@ Ramdisk                   Size      Used Available Use% Mounted on
 --- stderr
 KEL_Get error for 'gone.t00' (Not found)
 Error fetching ramdisk list (Out of memory)
-=== case live in the simulator as in cache mode
-snapshot: empty
-mode: sim
-run: vdf -p
-exit: 0
---- stdout
-Tardisk                                       Used                         Space
------
-Ramdisk                    Min       Max      Used  Sure avl Maybe avl Peak used

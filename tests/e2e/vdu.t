@@ -50,6 +50,9 @@ The tree of most cases ("main"):
    "ramdisks": {"$listStatus": "0xbad0017"}}}}}
 === snapshot readme-unreadable extends disks
 {"tree": {"system": {"corafs": {"inodes": {"@INO": {"stats": {"$status": "0xbad0001"}}}}}}}
+=== snapshot long-root extends disks
+{"simulator": {"corafsRoot": "@ROOT", "corafsRules": [
+   {"path": "", "kind": "ramdisk", "disk": "root", "flags": 64}]}}
 === snapshot unlinked
 {"buildDate": "Nov 30 2026",
  "tree": {"system": {"corafs": {
@@ -107,18 +110,6 @@ mode: sim
 setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
 cwd: @TMP/root
 run: vdu -s
-exit: 0
---- stdout
-For '.':
-                          ramdisk root:            0		(    2 inodes)
-                     tardisk tools.t00:            0		(    1 inodes)
-                          ramdisk logs:         5000		(    1 inodes)
-=== case -d x acts as -s
-snapshot: disks
-mode: sim
-setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
-cwd: @TMP/root
-run: vdu -d x
 exit: 0
 --- stdout
 For '.':
@@ -217,16 +208,6 @@ setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guid
 cwd: @TMP/root
 run: vdu docs/empty
 exit: 0
-=== case an empty file as the start with -i
-snapshot: disks
-mode: sim
-setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
-cwd: @TMP/root
-run: vdu -i docs/empty
-exit: 0
---- stdout
-For 'docs/empty':
-                          ramdisk root:            0
 === case flag bit 6: an inode counted, its bytes not
 snapshot: readme-not-charged
 mode: sim
@@ -240,13 +221,6 @@ For 'docs/guide/readme':
 For 'docs/guide':
                           ramdisk root:            0		(    1 inodes)
                           ramdisk logs:            0		(    1 inodes)
-=== case a path on another device is not counted
-snapshot: disks
-mode: sim
-setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
-cwd: @TMP/root
-run: vdu -a mnt
-exit: 0
 === case "/" is not the corafs root off the host: nothing counted
 snapshot: disks
 mode: sim
@@ -356,12 +330,31 @@ run: vdu -a @START
 exit: 0
 --- stderr
 path too long for '@START' (4096)
-=== case an entry name that would take the path past 4095 bytes is skipped
-# The simulator indexes the root by absolute paths of at most 4095 bytes:
-# this tree fits while @TMP/root is shorter than about 110 bytes.
+=== case a real directory at a start path of 4095 bytes is known: no room for the slash
 snapshot: disks
 mode: sim
-setup: mkdir -p root && cd root && for i in $(seq 20); do d=$(printf 'd%.0s' $(seq 198)); mkdir $d && cd $d; done && truncate -s 10 $(printf 'n%.0s' $(seq 240)) && mkdir ok && truncate -s 20 ok/f
+setup: mkdir -p root && cd root && for i in $(seq 20); do d=$(printf 'd%.0s' $(seq 200)); mkdir $d && cd -P $d; done && mkdir $(printf 'e%.0s' $(seq 73))
+value: START printf '.'; for i in $(seq 20); do printf '/'; printf 'd%.0s' $(seq 200); done; printf '/'; printf 'e%.0s' $(seq 73)
+cwd: @TMP/root
+run: vdu -s @START
+exit: 0
+--- stderr
+path too long for '@START' (4096)
+=== case a root with a long absolute path: what lies deep below it is counted
+snapshot: long-root
+mode: sim
+setup: r=.; for i in $(seq 7); do r=$r/$(printf 'r%.0s' $(seq 250)); done; mkdir -p $r && cd $r && for i in $(seq 10); do d=$(printf 'd%.0s' $(seq 250)); mkdir $d && cd -P $d; done && truncate -s 10 f
+value: ROOT printf '%s' @TMP; for i in $(seq 7); do printf '/'; printf 'r%.0s' $(seq 250); done
+cwd: @ROOT
+run: vdu -s
+exit: 0
+--- stdout
+For '.':
+                          ramdisk root:            0		(   12 inodes)
+=== case an entry name that would take the path past 4095 bytes is skipped
+snapshot: disks
+mode: sim
+setup: mkdir -p root && cd root && for i in $(seq 20); do d=$(printf 'd%.0s' $(seq 198)); mkdir $d && cd -P $d; done && truncate -s 10 $(printf 'n%.0s' $(seq 240)) && mkdir ok && truncate -s 20 ok/f
 value: DEEP printf '.'; for i in $(seq 20); do printf '/'; printf 'd%.0s' $(seq 198); done
 value: LONG printf 'n%.0s' $(seq 240)
 cwd: @TMP/root
@@ -452,20 +445,6 @@ run: vdu -x
 exit: 1
 --- stderr
 vdu: invalid option -- 'x'
-Gather stats about corafs
-corafsdu [filepath]
-   -h       multiple instead of bytes
-   -d depth reports for each element up to that depth (default 1)
-   -a       equivalent to unlimited depth
-   -s       equivalent to zero depth
-   -u       display stats for unlinked files
-=== case -d without its depth: usage
-snapshot: disks
-mode: sim
-run: vdu -d
-exit: 1
---- stderr
-vdu: option requires an argument -- 'd'
 Gather stats about corafs
 corafsdu [filepath]
    -h       multiple instead of bytes

@@ -21,11 +21,14 @@ vdu::Bucket Make(uint32_t kind, const char *name, uint64_t bytes, uint32_t inode
 }
 
 std::string Prefix(const std::string &path, bool *ok, std::string *messages) {
-   std::string prefix;
+   char buffer[vdu::kPathBufferSize];
    testing::internal::CaptureStderr();
-   *ok = vdu::DirectoryPrefix(path.c_str(), &prefix);
+   size_t length = vdu::DirectoryPrefix(path.c_str(), buffer);
    *messages = testing::internal::GetCapturedStderr();
-   return prefix;
+   *ok = length != 0;
+   if (!*ok) return "";
+   EXPECT_EQ(std::strlen(buffer), length);
+   return std::string(buffer, length);
 }
 
 }  // namespace

@@ -6,6 +6,7 @@
 #include <cinttypes>
 #include <cstdio>
 
+#include "kel/corafsrecords.h"
 #include "keltools.h"
 #include "records.h"
 
@@ -17,25 +18,6 @@ constexpr char kUsage[] =
    "corafsdf [filepath]\n"
    "   -h       multiple instead of blocks\n"
    "   -p       resource pool view\n";
-
-// Tardisk stats record (28 bytes asked for):
-//    0  u32  size in bytes
-//    8  u8   set when the tardisk is a boot module (read by bootOption)
-constexpr uint32_t kTardiskStatsSize = 28;
-constexpr size_t kTardiskSize = 0;
-
-// Ramdisk stats record (180 bytes asked for):
-//    0  u32  minimum (reserved) size in MiB
-//    4  u32  maximum size in MiB
-//    8  u32  pages in use (4096 bytes each)
-//   12  u32  peak pages in use
-constexpr uint32_t kRamdiskStatsSize = 180;
-constexpr size_t kRamdiskMinMiB = 0;
-constexpr size_t kRamdiskMaxMiB = 4;
-constexpr size_t kRamdiskUsedPages = 8;
-constexpr size_t kRamdiskPeakPages = 12;
-
-constexpr uint32_t kPageSize = 4096;
 
 enum class Disk { Tar, Ram };
 
@@ -76,8 +58,10 @@ void PrintHeader(Disk disk, const View &view) {
 }
 
 void PrintTardiskRow(const char *name, const uint8_t *record, const View &view) {
-   uint64_t used = ReadU32(record, kTardiskSize);
-   uint64_t space = (used + kPageSize - 1) & ~uint64_t(kPageSize - 1);
+   constexpr uint64_t kPage = ramdiskstats::kPageSize;
+   uint64_t used = ReadU32(record, tardiskstats::kSizeBytes);
+   // The space a tardisk takes: its size rounded up to whole pages.
+   uint64_t space = (used + kPage - 1) & ~(kPage - 1);
    if (view.pool)
       std::printf("%-20s%10s%10s%10s%10s%10s%10s\n", name, "", "", Show(view, used).text, "", "",
                   Show(view, space).text);
@@ -86,10 +70,10 @@ void PrintTardiskRow(const char *name, const uint8_t *record, const View &view) 
 }
 
 void PrintRamdiskRow(const char *name, const uint8_t *record, const View &view) {
-   uint64_t min = uint64_t(ReadU32(record, kRamdiskMinMiB)) << 20;
-   uint64_t max = uint64_t(ReadU32(record, kRamdiskMaxMiB)) << 20;
-   uint64_t used = uint64_t(ReadU32(record, kRamdiskUsedPages)) * kPageSize;
-   uint64_t peak = uint64_t(ReadU32(record, kRamdiskPeakPages)) * kPageSize;
+   uint64_t min = uint64_t(ReadU32(record, ramdiskstats::kMinMiB)) << 20;
+   uint64_t max = uint64_t(ReadU32(record, ramdiskstats::kMaxMiB)) << 20;
+   uint64_t used = uint64_t(ReadU32(record, ramdiskstats::kUsedPages)) * ramdiskstats::kPageSize;
+   uint64_t peak = uint64_t(ReadU32(record, ramdiskstats::kPeakPages)) * ramdiskstats::kPageSize;
    // What is left of the reservation, and of the maximum; never below 0.
    uint64_t sureAvailable = min >= used ? min - used : 0;
    uint64_t maybeAvailable = max >= used ? max - used : 0;
@@ -107,43 +91,44 @@ void PrintRamdiskRow(const char *name, const uint8_t *record, const View &view) 
 // fetched.  A disk whose stats cannot be read is reported and left out.
 bool PrintTable(Disk disk, const View &view) {
    const bool tar = disk == Disk::Tar;
-   ParamListPtr disks;
-   KEL_Status status =
-      GetInstanceList(tar ? KEL_NODE_system_corafs_tardisks : KEL_NODE_system_corafs_ramdisks, nullptr, &disks);
-   if (status != KEL_STATUS_OK) {
+   const KEL_Node listNode = tar ? KEL_NODE_system_corafs_tardisks : KEL_NODE_system_corafs_ramdisks;
+   const KEL_Node statsNode = tar ? KEL_NODE_system_corafs_tardisks_stats : KEL_NODE_system_corafs_ramdisks_stats;
+   const uint32_t recordSize = tar ? tardiskstats::kSize : ramdiskstats::kSize;
+   ParamListPtr keys(KEL_ParamListCreate(1, 1));
+   WalkResult walk{WalkEnd::ListFailed, KEL_STATUS_NO_MEMORY};
+   if (keys) {
+      walk = ForEachInstance(listNode, keys.get(), [&](const KEL_Param *key) {
+         const char *name = KEL_ParamGetString(key);
+         if (name == nullptr) {
+            // A disk list holds names; show any other key as its number.
+            char number[24];
+            std::snprintf(number, sizeof number, "%" PRId64, KEL_ParamGetInt(key));
+            std::fprintf(stderr, "KEL_Get error for '%s' (%s)\n", number,
+                         ORX_ReturnStatusToString(KEL_STATUS_BAD_PARAM));
+            return true;
+         }
+         static_assert(tardiskstats::kSize <= ramdiskstats::kSize);
+         uint8_t record[ramdiskstats::kSize];
+         KEL_Status status = KEL_Get(statsNode, keys.get(), record, recordSize);
+         if (status != KEL_STATUS_OK) {
+            std::fprintf(stderr, "KEL_Get error for '%s' (%s)\n", name, ORX_ReturnStatusToString(status));
+            return true;
+         }
+         if (tar)
+            PrintTardiskRow(name, record, view);
+         else
+            PrintRamdiskRow(name, record, view);
+         return true;
+      });
+   }
+   if (walk.end == WalkEnd::ListFailed) {
       std::fprintf(stderr, "Error fetching %sdisk list (%s)\n", tar ? "tar" : "ram",
-                   ORX_ReturnStatusToString(status));
+                   ORX_ReturnStatusToString(walk.status));
       return false;
    }
-   const KEL_Node statsNode = tar ? KEL_NODE_system_corafs_tardisks_stats : KEL_NODE_system_corafs_ramdisks_stats;
-   const uint32_t recordSize = tar ? kTardiskStatsSize : kRamdiskStatsSize;
-   uint32_t count = KEL_ParamListUsedCount(disks.get());
-   for (uint32_t i = 0; i < count; i++) {
-      const KEL_Param *entry = KEL_ParamListGetParam(disks.get(), i);
-      const char *name = entry ? KEL_ParamGetString(entry) : nullptr;
-      char number[24];
-      if (name == nullptr) {
-         // A disk list holds names; show any other key as its number.
-         std::snprintf(number, sizeof number, "%" PRId64, entry ? KEL_ParamGetInt(entry) : int64_t(0));
-         std::fprintf(stderr, "KEL_Get error for '%s' (%s)\n", number,
-                      ORX_ReturnStatusToString(KEL_STATUS_BAD_PARAM));
-         continue;
-      }
-      ParamListPtr keys(KEL_ParamListCreate(1, 1));
-      status = keys ? KEL_ParamListAddString(keys.get(), name) : KEL_Status(KEL_STATUS_NO_MEMORY);
-      uint8_t record[kRamdiskStatsSize];
-      if (status == KEL_STATUS_OK) status = KEL_Get(statsNode, keys.get(), record, recordSize);
-      keys.reset();
-      if (status != KEL_STATUS_OK) {
-         std::fprintf(stderr, "KEL_Get error for '%s' (%s)\n", name, ORX_ReturnStatusToString(status));
-         continue;
-      }
-      if (tar)
-         PrintTardiskRow(name, record, view);
-      else
-         PrintRamdiskRow(name, record, view);
-   }
-   return true;
+   // A key that could not be appended (reported by AddParamToList) leaves
+   // the table incomplete.
+   return walk.end == WalkEnd::Done;
 }
 
 }  // namespace

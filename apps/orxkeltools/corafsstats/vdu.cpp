@@ -12,12 +12,9 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
-#include <memory>
-#include <new>
-#include <string>
 #include <string_view>
-#include <vector>
 
+#include "kel/corafsrecords.h"
 #include "keltools.h"
 #include "records.h"
 
@@ -35,76 +32,74 @@ constexpr char kUsage[] =
 
 constexpr uint32_t kUnlimitedDepth = 0x100000;
 
-// Inode stats record (544 bytes):
-//     4  u32   flags: bit 0 on a tardisk (else a ramdisk), bit 6 size not charged
-//    20  u32   link state, 0xFFFFFFFC when unlinked
-//    28  u32   size in bytes
-//    32  text  tardisk name (128 bytes)
-//   160  text  ramdisk name (128 bytes)
-//   288  text  file name (256 bytes)
-constexpr uint32_t kInodeStatsSize = 544;
-constexpr size_t kInodeFlags = 4;
-constexpr size_t kInodeLinkState = 20;
-constexpr size_t kInodeSize = 28;
-constexpr size_t kInodeTardisk = 32;
-constexpr size_t kInodeRamdisk = 160;
-constexpr size_t kInodeName = 288;
-constexpr size_t kDiskNameWidth = 128;
-constexpr size_t kFileNameWidth = 256;
-
-constexpr uint32_t kOnTardisk = 0x1;
-constexpr uint32_t kNotCharged = 0x40;
-constexpr uint32_t kUnlinked = 0xFFFFFFFC;
-
 constexpr uint32_t kTardisk = 0, kRamdisk = 1;
 constexpr const char *kKindNames[] = {"tardisk", "ramdisk"};
 
 // The device number the in-memory root file system reports.
 constexpr dev_t kCorafsDevice = 1;
 
-using BucketTable = std::unique_ptr<vdu::Bucket[]>;
-
-BucketTable NewTable(uint32_t count) { return BucketTable(new (std::nothrow) vdu::Bucket[count]()); }
+// What vdu says when a table or a buffer of its walk cannot be allocated.
+constexpr char kNoMemory[] = "unable to allocate memory for stats";
 
 KEL_Status ReadInodeStats(uint64_t inode, uint8_t *record) {
    ParamListPtr keys(KEL_ParamListCreate(1, 1));
    if (!keys) return KEL_STATUS_NO_MEMORY;
    KEL_Status status = KEL_ParamListAddInt(keys.get(), inode);
    if (status != KEL_STATUS_OK) return status;
-   return KEL_Get(KEL_NODE_system_corafs_inodes_stats, keys.get(), record, kInodeStatsSize);
+   return KEL_Get(KEL_NODE_system_corafs_inodes_stats, keys.get(), record, inodestats::kSize);
 }
 
 // Fills the entry's own bucket from its inode stats; false (after the
 // message) when they cannot be read.  *size is the record's size field.
 bool ReadOwnBucket(const char *path, uint64_t inode, vdu::Bucket *own, uint32_t *size) {
-   uint8_t record[kInodeStatsSize];
+   uint8_t record[inodestats::kSize];
    KEL_Status status = ReadInodeStats(inode, record);
    if (status != KEL_STATUS_OK) {
       std::fprintf(stderr, "KEL_Get error for '%s' (%s)\n", path, ORX_ReturnStatusToString(status));
       return false;
    }
-   uint32_t flags = ReadU32(record, kInodeFlags);
-   *size = ReadU32(record, kInodeSize);
-   bool tardisk = flags & kOnTardisk;
-   std::string_view disk = ReadText(record, tardisk ? kInodeTardisk : kInodeRamdisk, kDiskNameWidth);
+   uint32_t flags = ReadU32(record, inodestats::kFlags);
+   *size = ReadU32(record, inodestats::kSizeBytes);
+   bool tardisk = flags & inodestats::kOnTardisk;
+   std::string_view disk =
+      ReadText(record, tardisk ? inodestats::kTardisk : inodestats::kRamdisk, inodestats::kDiskNameWidth);
    size_t n = std::min(disk.size(), sizeof own->name - 1);
    std::memcpy(own->name, disk.data(), n);
    own->name[n] = '\0';
    own->kind = tardisk ? kTardisk : kRamdisk;
-   own->bytes = flags & kNotCharged ? 0 : *size;
+   own->bytes = flags & inodestats::kNotCharged ? 0 : *size;
    own->inodes = 1;
    return true;
 }
 
-// The names of a directory's entries in readdir order; false when it cannot
-// be opened.  Reading them all first keeps one directory open at a time, so
-// deep trees do not run out of file descriptors.
-bool ReadEntryNames(const char *path, std::vector<std::string> *names) {
+// The names of a directory's entries in readdir order, one after another,
+// each with its NUL.
+struct EntryNames {
+   MallocPtr<char> text;
+   size_t capacity = 0;
+   size_t length = 0;
+};
+
+// Reads the names of the directory at path; false when it cannot be opened
+// or (after the message) when its names cannot be held.  Reading them all
+// first keeps one directory open at a time, so deep trees do not run out of
+// file descriptors.
+bool ReadEntryNames(const char *path, EntryNames *names) {
    DIR *dir = opendir(path);
    if (dir == nullptr) return false;
-   while (const dirent *e = readdir(dir)) names->emplace_back(e->d_name);
+   bool held = true;
+   while (const dirent *e = readdir(dir)) {
+      size_t size = std::strlen(e->d_name) + 1;
+      if (!GrowArray(&names->text, &names->capacity, names->length + size)) {
+         std::fputs(kNoMemory, stderr);
+         held = false;
+         break;
+      }
+      std::memcpy(names->text.get() + names->length, e->d_name, size);
+      names->length += size;
+   }
    closedir(dir);
-   return true;
+   return held;
 }
 
 bool IsDotOrDotDot(std::string_view name) { return name == "." || name == ".."; }
@@ -144,14 +139,14 @@ KEL_Status ReportUnlinked(bool human) {
       }
       status = KEL_ParamListAddInt(keys.get(), inode);
       if (status != KEL_STATUS_OK) break;
-      uint8_t record[kInodeStatsSize];
-      status = KEL_Get(KEL_NODE_system_corafs_inodes_stats, keys.get(), record, kInodeStatsSize);
+      uint8_t record[inodestats::kSize];
+      status = KEL_Get(KEL_NODE_system_corafs_inodes_stats, keys.get(), record, inodestats::kSize);
       // An inode that cannot be read is passed over.
-      if (status != KEL_STATUS_OK || ReadU32(record, kInodeLinkState) != kUnlinked) continue;
+      if (status != KEL_STATUS_OK || ReadU32(record, inodestats::kLinkState) != inodestats::kUnlinked) continue;
       if (found++ == 0) std::printf("Unlinked files:\n");
-      uint32_t size = ReadU32(record, kInodeSize);
+      uint32_t size = ReadU32(record, inodestats::kSizeBytes);
       bytes += size;
-      std::string_view name = ReadText(record, kInodeName, kFileNameWidth);
+      std::string_view name = ReadText(record, inodestats::kName, inodestats::kNameWidth);
       std::printf("%38.*s: ", int(name.size()), name.data());
       PrintSizeColumn(human, size);
       std::printf("\n");
@@ -203,26 +198,25 @@ void MergeBucket(Bucket *table, uint32_t *used, uint32_t count, const Bucket &ch
    std::fprintf(stderr, "Not enough dustats buckets\n");
 }
 
-bool DirectoryPrefix(const char *path, std::string *prefix) {
+size_t DirectoryPrefix(const char *path, char *buffer) {
    size_t length = std::strlen(path);
    if (length > kPathBufferSize - 1) {
       std::fprintf(stderr, "path too long for '%s' (%d)\n", path, int(length));
-      return false;
+      return 0;
    }
-   prefix->reserve(kPathBufferSize);
    if (length == 0) {
-      prefix->assign("/");
-   } else if (path[length - 1] == '/') {
-      prefix->assign(path, length);
-   } else {
-      if (length + 1 == kPathBufferSize) {
-         std::fprintf(stderr, "path too long for '%s' (%d)\n", path, int(kPathBufferSize));
-         return false;
-      }
-      prefix->assign(path, length);
-      prefix->push_back('/');
+      std::memcpy(buffer, "/", 2);
+      return 1;
    }
-   return true;
+   std::memcpy(buffer, path, length + 1);
+   if (path[length - 1] == '/') return length;
+   if (length + 1 == kPathBufferSize) {
+      std::fprintf(stderr, "path too long for '%s' (%d)\n", path, int(kPathBufferSize));
+      return 0;
+   }
+   buffer[length] = '/';
+   buffer[length + 1] = '\0';
+   return length + 1;
 }
 
 void PrintStats(const Settings &settings, const char *path, const Bucket *table, uint32_t used,
@@ -257,27 +251,33 @@ uint32_t Walk(const Settings &settings, const char *path, uint32_t depth, Bucket
       return 1;
    }
 
-   std::vector<std::string> names;
+   EntryNames names;
    if (!ReadEntryNames(path, &names)) return 0;
-   std::string childPath;
-   if (!DirectoryPrefix(path, &childPath)) return 0;
-   const size_t prefixLength = childPath.size();
+   // Each level has its own path buffer: the child paths of this directory.
+   MallocPtr<char> childPath = AllocArray<char>(kPathBufferSize);
+   if (!childPath) {
+      std::fputs(kNoMemory, stderr);
+      return 0;
+   }
+   const size_t prefixLength = DirectoryPrefix(path, childPath.get());
+   if (prefixLength == 0) return 0;
    uint32_t used = 1;
-   for (const std::string &name : names) {
-      if (prefixLength + name.size() + 1 > kPathBufferSize - 1) {
-         std::fprintf(stderr, "path too long for '%s' '%s' (%d)\n", path, name.c_str(),
-                      int(prefixLength + name.size()));
+   for (size_t at = 0; at < names.length;) {
+      const char *name = names.text.get() + at;
+      const size_t nameLength = std::strlen(name);
+      at += nameLength + 1;
+      if (prefixLength + nameLength + 1 > kPathBufferSize - 1) {
+         std::fprintf(stderr, "path too long for '%s' '%s' (%d)\n", path, name, int(prefixLength + nameLength));
          continue;
       }
       if (IsDotOrDotDot(name)) continue;
-      childPath.resize(prefixLength);
-      childPath += name;
-      BucketTable child = NewTable(count);
+      std::memcpy(childPath.get() + prefixLength, name, nameLength + 1);
+      MallocPtr<Bucket> child = AllocArray<Bucket>(count);
       if (!child) {
-         std::fprintf(stderr, "unable to allocate memory for stats");
+         std::fputs(kNoMemory, stderr);
          continue;
       }
-      uint32_t filled = Walk(settings, childPath.c_str(), depth + 1, child.get(), count);
+      uint32_t filled = Walk(settings, childPath.get(), depth + 1, child.get(), count);
       for (uint32_t i = 0; i < filled; i++) MergeBucket(table, &used, count, child[i]);
    }
    if (depth <= settings.maxDepth) PrintStats(settings, path, table, used, true);
@@ -315,7 +315,7 @@ int VduMain(int argc, char **argv) {
    if (unlinked) return ReportUnlinked(settings.human) == KEL_STATUS_OK ? 0 : 1;
 
    uint32_t count = CountDisks();
-   BucketTable table = NewTable(count);
+   MallocPtr<vdu::Bucket> table = AllocArray<vdu::Bucket>(count);
    if (!table) return -12;
    vdu::Walk(settings, start, 0, table.get(), count);
    return 0;

@@ -2,8 +2,8 @@
 #ifndef ORXKELTOOLS_CORAFSSTATS_VDU_H
 #define ORXKELTOOLS_CORAFSSTATS_VDU_H
 
+#include <cstddef>
 #include <cstdint>
-#include <string>
 
 namespace vdu {
 
@@ -35,9 +35,10 @@ uint32_t Walk(const Settings &settings, const char *path, uint32_t depth, Bucket
 // takes the next free one; reports when the table is full.
 void MergeBucket(Bucket *table, uint32_t *used, uint32_t count, const Bucket &child);
 
-// The text that child paths of the directory at path start with; false (after
-// the message) when the path is too long to build on.
-bool DirectoryPrefix(const char *path, std::string *prefix);
+// Writes into buffer (kPathBufferSize bytes) the text that child paths of
+// the directory at path start with, NUL-terminated, and returns its length;
+// 0 (after the message) when the path is too long to build on.
+size_t DirectoryPrefix(const char *path, char *buffer);
 
 void PrintStats(const Settings &settings, const char *path, const Bucket *table, uint32_t used,
                 bool showInodes);

@@ -4,10 +4,11 @@
 
 #include <algorithm>
 #include <cstdio>
-#include <cstdlib>
 #include <cstring>
 #include <string_view>
 
+#include "kel/corafsrecords.h"
+#include "kel/sysinforecords.h"
 #include "keltools.h"
 #include "records.h"
 
@@ -47,23 +48,6 @@ constexpr std::string_view kHelp =
    "  -c --bootOptionFileContent    Content of a boot option file used to boot\n"
    "  -C --bootOptionFilesContent   Content of all boot option files used to boot\n";
 
-// Boot option record (4 bytes): audit mode at 0, file-system check mode at 1,
-// booted after rollback at 2, each u8.
-constexpr uint32_t kBootOptionSize = 4;
-constexpr size_t kAuditOff = 0, kFsckOff = 1, kRollbackOff = 2;
-// Boot command line (4096 bytes): "<kernel> <options>", NUL-terminated.
-constexpr uint32_t kCmdLineSize = 4096;
-// Boot MAC record (24 bytes): non-zero u8 at 0 when booted over the network.
-constexpr uint32_t kBootMacSize = 24;
-constexpr size_t kPxeOff = 0;
-// Tardisk stats record (28 bytes): non-zero u8 at 8 when the tardisk is a
-// module used to boot.
-constexpr uint32_t kTardiskStatsSize = 28;
-constexpr size_t kBootModuleOff = 8;
-
-// Chunk request record (8 bytes), the input of a content read:
-//    0 offset of the first byte wanted (u32)   4 bytes wanted (u32)
-constexpr uint32_t kChunkRequestSize = 8;
 // Contents are read at most 3 MiB at a time.
 constexpr uint32_t kMaxChunk = 0x300000;
 
@@ -74,13 +58,10 @@ struct Request {
    const char *contentName = nullptr;  // -c: the last one given
 };
 
-[[noreturn]] void Help() {
+// Writes the help text; the handler then ends with status 1.
+int Help() {
    std::fwrite(kHelp.data(), 1, kHelp.size(), stderr);
-   std::exit(1);
-}
-
-void PutU32(uint8_t *rec, size_t off, uint32_t value) {
-   for (int i = 0; i < 4; i++) rec[off + i] = uint8_t(value >> 8 * i);
+   return 1;
 }
 
 // Prints the label unless the output is raw.
@@ -98,10 +79,10 @@ KEL_Status ListBootOptionFiles(ParamListPtr *files) {
 // Reads one chunk of a file's content into out, the chunk request sent as
 // a data object of its own.
 KEL_Status ReadChunk(const KEL_ParamList *keys, uint32_t offset, uint32_t chunk, KELData *out) {
-   uint8_t request[kChunkRequestSize];
-   PutU32(request, 0, offset);
-   PutU32(request, 4, chunk);
-   KELDataPtr in(KELData_Create(kChunkRequestSize, request, sizeof request));
+   uint8_t request[chunkrequest::kSize];
+   PutU32(request, chunkrequest::kOffset, offset);
+   PutU32(request, chunkrequest::kCount, chunk);
+   KELDataPtr in(KELData_Create(chunkrequest::kSize, request, sizeof request));
    if (!in) return KEL_STATUS_NO_MEMORY;
    return KEL_SetData(KEL_NODE_system_bootOptionFiles_content, keys, in.get(), out);
 }
@@ -160,7 +141,7 @@ void PrintSwitch(const Request &req, const char *label, uint8_t value) {
 int BootOptionMain(int argc, char **argv) {
    if (argc < 2) {
       std::fputs("bootOption: no option specified\n", stderr);
-      Help();
+      return Help();
    }
    Request req;
    int c;
@@ -178,27 +159,27 @@ int BootOptionMain(int argc, char **argv) {
       case 'b': req.files = true; break;
       case 'c': req.contentName = optarg; break;
       case 'C': req.allContents = true; break;
-      default: Help();  // -h, -u, -w and unrecognised options
+      default: return Help();  // -h, -u, -w and unrecognised options
       }
    }
 
    if (req.fsck || req.audit || req.rollback) {
-      uint8_t rec[kBootOptionSize];
+      uint8_t rec[bootoption::kSize];
       if (KEL_Get(KEL_NODE_system_bootOption, nullptr, rec, sizeof rec) != KEL_STATUS_OK) return 1;
-      if (req.fsck) PrintSwitch(req, "FS Check : ", ReadU8(rec, kFsckOff));
-      if (req.audit) PrintSwitch(req, "Audit Mode : ", ReadU8(rec, kAuditOff));
-      if (req.rollback) PrintSwitch(req, "Booted after rollback : ", ReadU8(rec, kRollbackOff));
+      if (req.fsck) PrintSwitch(req, "FS Check : ", ReadU8(rec, bootoption::kFsck));
+      if (req.audit) PrintSwitch(req, "Audit Mode : ", ReadU8(rec, bootoption::kAudit));
+      if (req.rollback) PrintSwitch(req, "Booted after rollback : ", ReadU8(rec, bootoption::kRollback));
    }
 
    // The command line "<kernel> <options>", split at its first space.
-   uint8_t cmdLine[kCmdLineSize];
+   uint8_t cmdLine[bootcmdline::kSize];
    std::string_view kernel, options;
    if (req.pxe || req.kernel || req.options) {
       if (KEL_Get(KEL_NODE_system_bootCmdLine, nullptr, cmdLine, sizeof cmdLine) != KEL_STATUS_OK) return 1;
       if (req.pxe) {
-         uint8_t mac[kBootMacSize];
+         uint8_t mac[bootmac::kSize];
          if (KEL_Get(KEL_NODE_system_bootMAC, nullptr, mac, sizeof mac) != KEL_STATUS_OK) return 1;
-         PrintSwitch(req, "Booted via (g)PXE : ", ReadU8(mac, kPxeOff) != 0 ? 1 : 0);
+         PrintSwitch(req, "Booted via (g)PXE : ", ReadU8(mac, bootmac::kPxe) != 0 ? 1 : 0);
       }
       kernel = ReadText(cmdLine, 0, sizeof cmdLine);
       size_t space = kernel.find(' ');
@@ -230,21 +211,19 @@ int BootOptionMain(int argc, char **argv) {
 
    if (req.modules) {
       Label(req, "Modules : ");
-      ParamListPtr tardisks;
-      if (GetInstanceList(KEL_NODE_system_corafs_tardisks, nullptr, &tardisks) != KEL_STATUS_OK) return 1;
-      // One key list serves every tardisk: its name is pushed, read and popped.
+      // A tardisk whose name or stats cannot be read fails the item.
       ParamListPtr keys(KEL_ParamListCreate(1, 1));
       if (!keys) return 1;
-      for (uint32_t i = 0, n = KEL_ParamListUsedCount(tardisks.get()); i < n; i++) {
-         const char *name;
-         if (KEL_ParamListGetString(tardisks.get(), i, &name) != KEL_STATUS_OK) return 1;
-         if (KEL_ParamListAddString(keys.get(), name) != KEL_STATUS_OK) return 1;
-         uint8_t stats[kTardiskStatsSize];
-         KEL_Status status = KEL_Get(KEL_NODE_system_corafs_tardisks_stats, keys.get(), stats, sizeof stats);
-         KEL_ParamListRemoveLastParam(keys.get());
-         if (status != KEL_STATUS_OK) return 1;
-         if (ReadU8(stats, kBootModuleOff) != 0) std::printf("%s ", name);
-      }
+      WalkResult walk = ForEachInstance(KEL_NODE_system_corafs_tardisks, keys.get(), [&](const KEL_Param *key) {
+         const char *name = KEL_ParamGetString(key);
+         uint8_t stats[tardiskstats::kSize];
+         if (name == nullptr ||
+             KEL_Get(KEL_NODE_system_corafs_tardisks_stats, keys.get(), stats, sizeof stats) != KEL_STATUS_OK)
+            return false;
+         if (ReadU8(stats, tardiskstats::kBootModule) != 0) std::printf("%s ", name);
+         return true;
+      });
+      if (walk.end != WalkEnd::Done) return 1;
       std::fputs("\n", stdout);
    }
 

@@ -2,9 +2,8 @@
 #include <getopt.h>
 
 #include <cstdio>
-#include <cstdlib>
-#include <cstring>
 
+#include "kel/sysinforecords.h"
 #include "keltools.h"
 #include "records.h"
 
@@ -22,19 +21,10 @@ constexpr char kHelp[] =
    "            -l, --level           Get release level information\n"
    "            -h, --help            Print this menu\n";
 
-// Version record (312 bytes): product name at 0 (32 bytes), version at 32
-// (64), release level at 96 (64), update at 160 (up to the build number),
-// build number at 292 (signed 32-bit).
-constexpr uint32_t kVersionSize = 312;
-constexpr size_t kProductOff = 0, kProductWidth = 32;
-constexpr size_t kVersionOff = 32, kVersionWidth = 64;
-constexpr size_t kLevelOff = 96, kLevelWidth = 64;
-constexpr size_t kUpdateOff = 160, kUpdateWidth = 132;
-constexpr size_t kBuildOff = 292;
-
-[[noreturn]] void Help() {
+// Writes the help text; the handler then ends with status 1.
+int Help() {
    std::fputs(kHelp, stderr);
-   std::exit(1);
+   return 1;
 }
 
 }  // namespace
@@ -42,34 +32,34 @@ constexpr size_t kBuildOff = 292;
 int HalvexMain(int argc, char **argv) {
    if (argc < 2) {
       std::fputs("halvex: no option specified\n", stderr);
-      Help();
+      return Help();
    }
-   bool version = false, level = false;
+   bool showVersion = false, showLevel = false;
    int c;
    while ((c = getopt_long(argc, argv, kShortOptions, kLongOptions, nullptr)) != -1) {
       if (c == 'v')
-         version = true;
+         showVersion = true;
       else if (c == 'l')
-         level = true;
+         showLevel = true;
       else
-         Help();
+         return Help();
    }
-   if (!version && !level) {
+   if (!showVersion && !showLevel) {
       std::fputs("halvex: Invalid arguments\n", stderr);
-      Help();
+      return Help();
    }
 
-   uint8_t rec[kVersionSize];
+   uint8_t rec[versioninfo::kSize];
    if (KEL_Get(KEL_NODE_system_version, nullptr, rec, sizeof rec) != KEL_STATUS_OK) return 1;
-   std::string_view product = ReadText(rec, kProductOff, kProductWidth);
-   std::string_view ver = ReadText(rec, kVersionOff, kVersionWidth);
-   std::string_view relLevel = ReadText(rec, kLevelOff, kLevelWidth);
-   std::string_view update = ReadText(rec, kUpdateOff, kUpdateWidth);
+   std::string_view product = ReadText(rec, versioninfo::kProduct, versioninfo::kProductWidth);
+   std::string_view ver = ReadText(rec, versioninfo::kVersion, versioninfo::kVersionWidth);
+   std::string_view relLevel = ReadText(rec, versioninfo::kLevel, versioninfo::kLevelWidth);
+   std::string_view update = ReadText(rec, versioninfo::kUpdate, versioninfo::kUpdateWidth);
 
-   if (version)
+   if (showVersion)
       std::printf("%.*s %.*s build-%.5d\n", int(product.size()), product.data(), int(ver.size()), ver.data(),
-                  ReadI32(rec, kBuildOff));
-   if (level) {
+                  ReadI32(rec, versioninfo::kBuild));
+   if (showLevel) {
       // Only a leading "0" means no update; an empty text counts as an update.
       if (update.empty() || update[0] != '0') {
          std::printf("%.*s %.*s %s%.*s\n", int(product.size()), product.data(), int(ver.size()), ver.data(),

@@ -6,6 +6,7 @@
 #include <cstdio>
 #include <cstdlib>
 
+#include "kel/sysinforecords.h"
 #include "keltools.h"
 #include "records.h"
 
@@ -25,22 +26,19 @@ constexpr char kUsage[] =
    "Valid date format: MM/DD/YYYY\n"
    "Valid time format: HH:MM:SS\n";
 
-// RTC record (32 bytes), plain signed 32-bit integers:
-//    0 hours   4 minutes   8 seconds   12 day   16 month   20 year   24.. unused
-constexpr uint32_t kRtcSize = 32;
-constexpr size_t kHoursOff = 0, kMinutesOff = 4, kSecondsOff = 8;
-constexpr size_t kDayOff = 12, kMonthOff = 16, kYearOff = 20;
-
 // A field of the new setting that no option supplied.
 constexpr int32_t kNotGiven = -1;
 
 // The new setting, in the order of the set request.
 enum Field { kMonth, kDay, kYear, kHours, kMinutes, kSeconds, kFieldCount };
-constexpr size_t kRecordOffset[kFieldCount] = {kMonthOff, kDayOff, kYearOff, kHoursOff, kMinutesOff, kSecondsOff};
+// Where each field of the setting stands in the clock's record.
+constexpr size_t kRecordOffset[kFieldCount] = {rtc::kMonth, rtc::kDay, rtc::kYear,
+                                               rtc::kHours, rtc::kMinutes, rtc::kSeconds};
 
-[[noreturn]] void Usage() {
+// Writes the usage text; the handler then ends with status 1.
+int Usage() {
    std::fputs(kUsage, stderr);
-   std::exit(1);
+   return 1;
 }
 
 // Reads three decimal integers separated by sep into out, as
@@ -86,7 +84,7 @@ int HwclockMain(int argc, char **argv) {
       else if (c == 'd')
          dateText = optarg;
       else
-         Usage();
+         return Usage();
    }
 
    int32_t setting[kFieldCount] = {kNotGiven, kNotGiven, kNotGiven, kNotGiven, kNotGiven, kNotGiven};
@@ -104,9 +102,9 @@ int HwclockMain(int argc, char **argv) {
    bool show = timeText == nullptr && dateText == nullptr;
    bool needClock = show;
    for (int32_t value : setting) needClock = needClock || value == kNotGiven;
-   uint8_t rtc[kRtcSize];
+   uint8_t current[rtc::kSize];
    if (needClock) {
-      KEL_Status status = KEL_Get(KEL_NODE_hardware_chipset_rtc, nullptr, rtc, sizeof rtc);
+      KEL_Status status = KEL_Get(KEL_NODE_hardware_chipset_rtc, nullptr, current, sizeof current);
       if (status != KEL_STATUS_OK) {
          std::fprintf(stderr, "Failed to read the hardware clock: %s\n", ORX_ReturnStatusToString(status));
          return 1;
@@ -114,14 +112,14 @@ int HwclockMain(int argc, char **argv) {
    }
 
    if (show) {
-      std::printf("%.2d:%.2d:%.2d   %.2d/%.2d/%.4d   UTC\n", ReadI32(rtc, kHoursOff), ReadI32(rtc, kMinutesOff),
-                  ReadI32(rtc, kSecondsOff), ReadI32(rtc, kMonthOff), ReadI32(rtc, kDayOff),
-                  ReadI32(rtc, kYearOff));
+      std::printf("%.2d:%.2d:%.2d   %.2d/%.2d/%.4d   UTC\n", ReadI32(current, rtc::kHours),
+                  ReadI32(current, rtc::kMinutes), ReadI32(current, rtc::kSeconds), ReadI32(current, rtc::kMonth),
+                  ReadI32(current, rtc::kDay), ReadI32(current, rtc::kYear));
       return 0;
    }
 
    for (int f = 0; f < kFieldCount; f++)
-      if (setting[f] == kNotGiven) setting[f] = ReadI32(rtc, kRecordOffset[f]);
+      if (setting[f] == kNotGiven) setting[f] = ReadI32(current, kRecordOffset[f]);
    KEL_Status status = SetClock(setting);
    if (status != KEL_STATUS_OK) {
       std::printf("KEL_Set error: 0x%x\n", status);

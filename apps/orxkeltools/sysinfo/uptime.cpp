@@ -3,20 +3,11 @@
 #include <cstdio>
 #include <ctime>
 
+#include "kel/sysinforecords.h"
 #include "keltools.h"
 #include "records.h"
 
 namespace {
-
-// Uptime record (8 bytes): seconds since boot, u32 at 0.
-constexpr uint32_t kUpTimeSize = 8;
-constexpr size_t kUpSecondsOff = 0;
-// PCPU count record (12 bytes): number of PCPUs, u32 at 4.
-constexpr uint32_t kNumPcpusSize = 12;
-constexpr size_t kNumPcpusOff = 4;
-// Load history record (144 bytes): load in percent of one PCPU, u32 at 4.
-constexpr uint32_t kLoadHistorySize = 144;
-constexpr size_t kLoadPctOff = 4;
 
 constexpr uint32_t kSecondsPerDay = 86400;
 
@@ -33,14 +24,6 @@ constexpr LoadHistory kLoadHistories[] = {
     "Failed to get 15 minute cpu load history.\n"},
 };
 
-// The exit status for a failed KEL call: the status itself, of which the
-// system keeps the low 8 bits; 1 when those bits are all 0, so that a failure
-// never looks like success.
-int FailureStatus(KEL_Status status) {
-   int low = int(status & 0xFF);
-   return low != 0 ? low : 1;
-}
-
 }  // namespace
 
 int UptimeMain(int, char **) {
@@ -52,13 +35,13 @@ int UptimeMain(int, char **) {
    }
    std::printf(" %2d:%02d:%02d ", local.tm_hour, local.tm_min, local.tm_sec);
 
-   uint8_t upTime[kUpTimeSize];
+   uint8_t upTime[uptimeinfo::kSize];
    KEL_Status status = KEL_Get(KEL_NODE_system_ntpclock_upTime, nullptr, upTime, sizeof upTime);
    if (status != KEL_STATUS_OK) {
       std::fputs("Failed to get ntpclock_uptime.\n", stderr);
-      return FailureStatus(status);
+      return KelExitStatus(status);
    }
-   uint32_t up = ReadU32(upTime, kUpSecondsOff);
+   uint32_t up = ReadU32(upTime, uptimeinfo::kSeconds);
    uint32_t days = up / kSecondsPerDay, hours = up / 3600 % 24, minutes = up / 60 % 60, seconds = up % 60;
    std::fputs("up ", stdout);
    if (days != 0)
@@ -66,15 +49,15 @@ int UptimeMain(int, char **) {
    else
       std::printf("%02u:%02u:%02u, ", hours, minutes, seconds);
 
-   uint8_t numPcpus[kNumPcpusSize];
+   uint8_t numPcpus[numpcpus::kSize];
    status = KEL_Get(KEL_NODE_sched_globalStats_numPcpus, nullptr, numPcpus, sizeof numPcpus);
    if (status != KEL_STATUS_OK) {
       std::fputs("Failed to get number of pcups.\n", stderr);
-      return FailureStatus(status);
+      return KelExitStatus(status);
    }
    // Each average is the load divided by 100 x PCPUs, formed in unsigned
    // 32-bit arithmetic; a count that makes it 0 (no PCPUs) cannot be used.
-   uint32_t pcpus = ReadU32(numPcpus, kNumPcpusOff);
+   uint32_t pcpus = ReadU32(numPcpus, numpcpus::kCount);
    uint32_t capacity = 100u * pcpus;
    if (capacity == 0) {
       std::fprintf(stderr, "Cannot average the load over %u pcpus.\n", pcpus);
@@ -90,18 +73,18 @@ int UptimeMain(int, char **) {
    status = KEL_ParamListAddInt(keys.get(), 0);
    if (status != KEL_STATUS_OK) {
       std::fputs("Failed to add inputparams.\n", stderr);
-      return FailureStatus(status);
+      return KelExitStatus(status);
    }
 
    double averages[3];
    for (size_t i = 0; i < 3; i++) {
-      uint8_t history[kLoadHistorySize];
+      uint8_t history[loadhistory::kSize];
       status = KEL_Get(kLoadHistories[i].node, keys.get(), history, sizeof history);
       if (status != KEL_STATUS_OK) {
          std::fputs(kLoadHistories[i].failure, stderr);
-         return FailureStatus(status);
+         return KelExitStatus(status);
       }
-      averages[i] = double(ReadU32(history, kLoadPctOff)) / double(capacity);
+      averages[i] = double(ReadU32(history, loadhistory::kLoadPct)) / double(capacity);
    }
    std::printf("load average: %.2f, %.2f, %.2f\n", averages[0], averages[1], averages[2]);
    return 0;
