@@ -44,6 +44,13 @@ backspace.
    "$int:@SELF": {"cmdline": "/usr/lib/orvik/bin/pgrep -f orvik"},
    "1001": {"cmdline": "orvikd --daemon"}
  }}}}
+=== snapshot wide-key
+{"buildDate": "Nov 30 2026",
+ "tree": {"userworld": {"cartel": {
+   "1001": {"cmdline": "crond"},
+   "4294967297": {"cmdline": "crond"},
+   "1002": {"cmdline": "crond"}
+ }}}}
 === case no arguments
 snapshot: cartels
 run: pgrep
@@ -198,3 +205,9 @@ snapshot: self
 run: pgrep -f orvik
 exit: 0
 --- stdout (any)
+=== case a cartel key beyond 32 bits is a failure, never cut to 1
+snapshot: wide-key
+run: pgrep -l crond
+exit: 3
+--- stdout
+1001 crond

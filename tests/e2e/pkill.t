@@ -39,6 +39,21 @@ ID.  Each shell writes the names of the signals it catches to NAME.sig.
 === snapshot unlisted
 {"buildDate": "Nov 30 2026",
  "tree": {"userworld": {"cartel": {"$listStatus": "0xbad0003"}}}}
+=== snapshot wide-key
+{"buildDate": "Nov 30 2026",
+ "tree": {"userworld": {"cartel": {
+   "1001": {"cmdline": "crond"},
+   "4294967297": {"cmdline": "crond"}
+ }}}}
+=== snapshot no-single-process
+{"buildDate": "Nov 30 2026",
+ "tree": {"userworld": {"cartel": {
+   "0": {"cmdline": "crond"},
+   "4294967295": {"cmdline": "crond"},
+   "2147483648": {"cmdline": "crond"},
+   "-5": {"cmdline": "crond"},
+   "1001": {"cmdline": "crond"}
+ }}}}
 === case by name: TERM to the matching cartel only
 snapshot: two
 mode: sim
@@ -261,3 +276,21 @@ check: sleep 0.3; ! test -e a.sig
 exit: 1
 --- stderr
 Using KEL cache is unsupported
+=== case a cartel key beyond 32 bits is refused, never cut to process 1
+snapshot: wide-key
+mode: sim
+env: ORXKEL_SIGNAL_RECORD=@TMP/signals
+exe: /usr/bin/unshare
+argv: unshare --user --map-root-user --fork --pid sh -c 'trap "echo TERM >> init.sig" TERM; @BIN/orxkeltools pkill crond; s=$?; exit $s'
+check: test "$(cat signals)" = "1001 15"
+check: ! test -e init.sig
+exit: 1
+--- stderr
+pkill: Bad parameter
+=== case IDs below 1 name no single process and are never signalled
+snapshot: no-single-process
+mode: sim
+env: ORXKEL_SIGNAL_RECORD=@TMP/signals
+run: pkill -HUP crond
+check: test "$(cat signals)" = "1001 1"
+exit: 0
