@@ -1,4 +1,5 @@
 // Parameter lists and data objects.
+#include <cstdint>
 #include <cstdlib>
 #include <cstring>
 #include <new>
@@ -81,11 +82,21 @@ const char *KEL_ParamGetString(const KEL_Param *param) {
    return param == nullptr ? nullptr : param->text;
 }
 
+// A 32-bit number is stored either as itself (signed or unsigned: 0xffffffff
+// reads as -1) or sign-extended to 64 bits when it is negative.  Any other
+// value has no 32-bit form: cutting it to its low 32 bits would turn an
+// absurd key into a plausible one (4294967297 into process 1), so it is a
+// bad entry.
 KEL_Status KEL_ParamListGetInt32(const KEL_ParamList *list, uint32_t index, int32_t *out) {
    const KEL_Param *p = KEL_ParamListGetParam(list, index);
    if (p == nullptr || out == nullptr) return KEL_STATUS_BAD_PARAM;
    if (p->kind == KEL_PARAM_STRING) return KEL_STATUS_BAD_PARAM;
-   *out = int32_t(uint32_t(p->value));
+   if (p->value <= UINT32_MAX)
+      *out = int32_t(uint32_t(p->value));
+   else if (int64_t(p->value) >= INT32_MIN && int64_t(p->value) < 0)
+      *out = int32_t(int64_t(p->value));
+   else
+      return KEL_STATUS_BAD_PARAM;
    return KEL_STATUS_OK;
 }
 

@@ -140,6 +140,14 @@ extern const uint32_t CpuSched_NumWaitStates;
 struct stat;
 int OrxFs_Lstat(const char *path, struct stat *st);
 
+/*
+ * Sends signal sig to process pid, as kill does: 0, or -1 with errno set.
+ * While ORXKEL_SIGNAL_RECORD names a file, nothing is signalled: each call
+ * appends "pid sig" and a newline to that file instead (see
+ * docs/simulator.md).
+ */
+int OrxProc_Signal(int32_t pid, int sig);
+
 #ifdef __cplusplus
 }
 #endif

@@ -63,17 +63,10 @@ Cartel    |      World name     |        Type         |   fd   |  Description
 1004        a-world-name-of-24-chars  a-type-text-of-twenty        3   /tmp/long
 1004        a-world-name-of-24-chars  PIPE                   123456   
 1005        exactly-twenty-chars  MMAP                   2147483647   /etc/motd (prot:RW/len:1)
-=== case live mode; arguments are ignored
+=== case no cartels: the two header lines (live mode; arguments are ignored)
 snapshot: no-cartels
 mode: sim
 run: lsof -a some words
-exit: 0
---- stdout
-Cartel    |      World name     |        Type         |   fd   |  Description     
-----------+---------------------+---------------------+--------+------------------
-=== case no cartels: the two header lines
-snapshot: no-cartels
-run: lsof
 exit: 0
 --- stdout
 Cartel    |      World name     |        Type         |   fd   |  Description     

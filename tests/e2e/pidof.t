@@ -91,11 +91,7 @@ run: pidof -s ntpd sh
 exit: 0
 --- stdout
 1004 
-=== case a name with a '/' not at the start is skipped
-snapshot: cartels
-run: pidof bin/crond
-exit: 1
-=== case a skipped name leaves the others searched
+=== case a name with a '/' not at the start is skipped; the others are searched
 snapshot: cartels
 run: pidof bin/crond sh
 exit: 0
@@ -127,18 +123,6 @@ exit: 0
 snapshot: cartels
 run: pidof -o 1001 -o 1002 -o 1003 crond
 exit: 1
-=== case -o with a non-number omits 0, which never matches
-snapshot: cartels
-run: pidof -o abc crond
-exit: 0
---- stdout
-1001 1002 1003 
-=== case -o with a number followed by text
-snapshot: cartels
-run: pidof -o 1003x crond
-exit: 0
---- stdout
-1001 1002 
 === case 256 omits are accepted
 snapshot: cartels
 run: pidof -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 -o 1 crond
@@ -173,17 +157,6 @@ run: pidof -z crond
 exit: 1
 --- stderr
 pidof: invalid option -- 'z'
-find the process ID of running programs
-pidof program program ...
-      -s   Single shot, only return one pid
-      -x   Scripts too, would also return ids of shells
-      -o   Pid to omit
-=== case -o without its argument: usage, status 1
-snapshot: cartels
-run: pidof -o
-exit: 1
---- stderr
-pidof: option requires an argument -- 'o'
 find the process ID of running programs
 pidof program program ...
       -s   Single shot, only return one pid

@@ -37,27 +37,9 @@ exit: 0
 snapshot: worlds
 run: userspaceof 13
 exit: 1
-=== case 12abc is world 12
-snapshot: worlds
-run: userspaceof 12abc
-exit: 0
---- stdout
-3 5 
 === case 0 is a bad world ID
 snapshot: worlds
 run: userspaceof 0
-exit: 1
---- stdout
-bad world ID
-=== case abc is a bad world ID
-snapshot: worlds
-run: userspaceof abc
-exit: 1
---- stdout
-bad world ID
-=== case the empty text is a bad world ID
-snapshot: worlds
-run: userspaceof ''
 exit: 1
 --- stdout
 bad world ID

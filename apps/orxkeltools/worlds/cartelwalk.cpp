@@ -28,14 +28,15 @@ KEL_Status WalkCartels(const regex_t &pattern, bool full, CartelVisitor visit, v
    KEL_Status status = GetInstanceList(KEL_NODE_userworld_cartel, nullptr, &cartels);
    if (status != KEL_STATUS_OK) return status;
 
+   // The visitors read the cartel ID from entry i of the cartel list itself,
+   // so the walk keeps the list rather than going through ForEachInstance.
    // One byte beyond the record keeps a command line that fills it terminated.
    char cmdline[kCmdlineSize + 1];
    uint32_t n = KEL_ParamListUsedCount(cartels.get());
    for (uint32_t i = 0; i < n; i++) {
-      if (!AddParamToList(KEL_ParamListGetParam(cartels.get(), i), keys.get()))
-         return KEL_STATUS_FAILURE;
+      ScopedKey cartel(keys.get(), KEL_ParamListGetParam(cartels.get(), i));
+      if (!cartel.ok()) return KEL_STATUS_FAILURE;
       status = KEL_Get(KEL_NODE_userworld_cartel_cmdline, keys.get(), cmdline, kCmdlineSize);
-      KEL_ParamListRemoveLastParam(keys.get());
       if (status == KEL_STATUS_NO_CARTEL) continue;
       if (status != KEL_STATUS_OK) return status;
 

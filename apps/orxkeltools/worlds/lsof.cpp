@@ -14,30 +14,6 @@ constexpr char kHeader[] =
 constexpr char kRule[] =
    "----------+---------------------+---------------------+--------+------------------";
 
-// Fd record (KEL_NODE_userworld_cartel_fd_fds, 2084 bytes):
-//
-//    4 type          text, ends before byte 100
-//  100 description   text, to the end of the record
-namespace fdrec {
-constexpr uint32_t kSize = 2084;
-constexpr size_t kType = 4;
-constexpr size_t kDescription = 100;
-}  // namespace fdrec
-
-// Mapping record (KEL_NODE_userworld_cartel_mem_mmaps, 2036 bytes):
-//
-//    8 length        u32     20 protection bits   u32 (1 readable, 2 writable)
-//   16 kind          u32     24 fd number         i32
-//   28 description   text, to the end of the record
-namespace mmaprec {
-constexpr uint32_t kSize = 2036;
-constexpr size_t kLength = 8;
-constexpr size_t kKind = 16;
-constexpr size_t kProt = 20;
-constexpr size_t kFd = 24;
-constexpr size_t kDescription = 28;
-}  // namespace mmaprec
-
 // Only mappings of this kind are listed.
 constexpr uint32_t kListedMappingKind = 2;
 
@@ -79,14 +55,14 @@ KEL_Status PrintFds(const CartelRow &row, KEL_ParamList *keys, const KEL_ParamLi
    uint32_t n = KEL_ParamListUsedCount(fds);
    for (uint32_t i = 0; i < n; i++) {
       int64_t fd = KEL_ParamGetInt(KEL_ParamListGetParam(fds, i));
-      KEL_Status status = KEL_ParamListAddInt(keys, uint64_t(fd));
-      if (status != KEL_STATUS_OK) {
+      ScopedKey fdKey(keys, uint64_t(fd));
+      if (!fdKey.ok()) {
+         // Appending to a list that exists fails only for want of memory.
          std::puts("failed to add fd to KEL parameter list");
-         return status;
+         return KEL_STATUS_NO_MEMORY;
       }
       if (KEL_Get(KEL_NODE_userworld_cartel_fd_fds, keys, rec, sizeof rec) == KEL_STATUS_OK)
          PrintFdRow(row, int32_t(fd), rec);
-      KEL_ParamListRemoveLastParam(keys);
    }
    return KEL_STATUS_OK;
 }
@@ -96,15 +72,14 @@ KEL_Status PrintMappings(const CartelRow &row, KEL_ParamList *keys, const KEL_Pa
    uint32_t n = KEL_ParamListUsedCount(mmaps);
    for (uint32_t i = 0; i < n; i++) {
       int64_t key = KEL_ParamGetInt(KEL_ParamListGetParam(mmaps, i));
-      KEL_Status status = KEL_ParamListAddInt(keys, uint64_t(key));
-      if (status != KEL_STATUS_OK) {
+      ScopedKey mappingKey(keys, uint64_t(key));
+      if (!mappingKey.ok()) {
          std::puts("failed to add mmap to KEL parameter list");
-         return status;
+         return KEL_STATUS_NO_MEMORY;
       }
       if (KEL_Get(KEL_NODE_userworld_cartel_mem_mmaps, keys, rec, sizeof rec) == KEL_STATUS_OK &&
           ReadU32(rec, mmaprec::kKind) == kListedMappingKind)
          PrintMappingRow(row, rec);
-      KEL_ParamListRemoveLastParam(keys);
    }
    return KEL_STATUS_OK;
 }
@@ -128,14 +103,6 @@ KEL_Status PrintCartel(int32_t cartelId, KEL_ParamList *keys) {
    return PrintMappings(row, keys, mmaps.get());
 }
 
-// The walk's result as an exit status: the system keeps the low 8 bits of
-// a status, so a failure whose low 8 bits are 0 ends with 1 instead of
-// passing for success.
-int ExitStatus(KEL_Status status) {
-   if (status == KEL_STATUS_OK) return 0;
-   return (status & 0xff) != 0 ? int(status & 0xff) : 1;
-}
-
 KEL_Status WalkWorldList() {
    ParamListPtr keys(KEL_ParamListCreate(1, 1));
    if (!keys) {
@@ -154,11 +121,12 @@ KEL_Status WalkWorldList() {
    uint32_t n = KEL_ParamListUsedCount(cartels.get());
    for (uint32_t i = 0; i < n; i++) {
       const KEL_Param *cartel = KEL_ParamListGetParam(cartels.get(), i);
+      // The first column shows the key's low 32 bits, signed.
       int32_t cartelId = int32_t(uint32_t(KEL_ParamGetInt(cartel)));
-      if (!AddParamToList(cartel, keys.get())) return KEL_STATUS_FAILURE;
+      ScopedKey cartelKey(keys.get(), cartel);
+      if (!cartelKey.ok()) return KEL_STATUS_FAILURE;
       status = PrintCartel(cartelId, keys.get());
       if (status != KEL_STATUS_OK) return status;
-      KEL_ParamListRemoveLastParam(keys.get());
    }
    return KEL_STATUS_OK;
 }
@@ -166,4 +134,4 @@ KEL_Status WalkWorldList() {
 }  // namespace
 
 // Takes no options; arguments are ignored.
-int LsofMain(int, char **) { return ExitStatus(WalkWorldList()); }
+int LsofMain(int, char **) { return KelExitStatus(WalkWorldList()); }

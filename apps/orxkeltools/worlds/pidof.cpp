@@ -39,16 +39,18 @@ struct Search {
 
 void Usage() { std::fwrite(kUsage, 1, sizeof kUsage - 1, stderr); }
 
-// What follows the last '/'; the whole text when there is none.
-std::string_view BaseName(std::string_view text) {
+// What follows the last '/' of a text: the whole text when it has none, the
+// empty text when it ends with '/'.  (Unlike a base name, trailing slashes
+// are not stripped first.)
+std::string_view AfterLastSlash(std::string_view text) {
    size_t slash = text.rfind('/');
    return slash == std::string_view::npos ? text : text.substr(slash + 1);
 }
 
-// A word of a command line names the program when it is the name, the
-// name's base name, or its own base name is the name.
+// A word of a command line names the program when it is the name, what
+// follows the name's last '/', or what follows its own last '/' is the name.
 bool NameMatches(std::string_view word, std::string_view name) {
-   return word == name || word == BaseName(name) || BaseName(word) == name;
+   return word == name || word == AfterLastSlash(name) || AfterLastSlash(word) == name;
 }
 
 bool IsShell(std::string_view word) {
@@ -63,19 +65,21 @@ bool Omitted(const Search &search, int32_t id) {
    return false;
 }
 
-// Tests the cartel whose key is the last entry of keys against one name and
-// prints its ID when it matches.  The cartel key doubles as the key of the
-// cartel's main world.
-bool CartelMatches(const Search &search, KEL_ParamList *keys, std::string_view name) {
+// Tests the cartel whose key is the last entry of cartelKeys against one name
+// and prints its ID when it matches.  The cartel key doubles as the key of
+// the cartel's main world; the command line is read under the cartel ID that
+// world names, on idKeys (empty between calls).
+bool CartelMatches(const Search &search, const KEL_ParamList *cartelKeys, KEL_ParamList *idKeys,
+                   std::string_view name) {
    uint8_t info[worldinfo::kSize];
-   if (KEL_Get(KEL_NODE_world_info, keys, info, sizeof info) != KEL_STATUS_OK) return false;
+   if (KEL_Get(KEL_NODE_world_info, cartelKeys, info, sizeof info) != KEL_STATUS_OK) return false;
    uint32_t cartelId = ReadU32(info, worldinfo::kCartelId);
    if (cartelId == 0) return false;
 
-   KEL_ParamListRemoveLastParam(keys);
-   if (KEL_ParamListAddInt(keys, cartelId) != KEL_STATUS_OK) return false;
+   ScopedKey idKey(idKeys, uint64_t(cartelId));
+   if (!idKey.ok()) return false;
    uint8_t cmdline[kCmdlineSize];
-   if (KEL_Get(KEL_NODE_userworld_cartel_cmdline, keys, cmdline, sizeof cmdline) != KEL_STATUS_OK)
+   if (KEL_Get(KEL_NODE_userworld_cartel_cmdline, idKeys, cmdline, sizeof cmdline) != KEL_STATUS_OK)
       return false;
 
    std::string_view text = ReadText(cmdline, 0, sizeof cmdline);
@@ -95,26 +99,26 @@ bool CartelMatches(const Search &search, KEL_ParamList *keys, std::string_view n
 // A failed append ends the walk and counts nothing for the name.
 unsigned SearchName(const Search &search, std::string_view name) {
    ParamListPtr keys(KEL_ParamListCreate(1, 1));
-   if (!keys) {
+   ParamListPtr idKeys(KEL_ParamListCreate(1, 1));
+   if (!keys || !idKeys) {
       std::fputs("CartelList: Not enough memory\n", stderr);
       return 0;
    }
-   ParamListPtr cartels;
-   KEL_Status status = GetInstanceList(KEL_NODE_userworld_cartel, nullptr, &cartels);
-   if (status != KEL_STATUS_OK) {
-      std::fprintf(stderr, "CartelList: error fetching cartel list 0x%x\n", status);
-      return 0;
-   }
    unsigned count = 0;
-   uint32_t n = KEL_ParamListUsedCount(cartels.get());
-   for (uint32_t i = 0; i < n; i++) {
-      if (!AddParamToList(KEL_ParamListGetParam(cartels.get(), i), keys.get())) return 0;
-      bool matched = CartelMatches(search, keys.get(), name);
-      KEL_ParamListRemoveLastParam(keys.get());
-      if (matched) {
-         count++;
-         if (search.singleShot) break;
-      }
+   WalkResult walk = ForEachInstance(KEL_NODE_userworld_cartel, keys.get(), [&](const KEL_Param *) {
+      if (!CartelMatches(search, keys.get(), idKeys.get(), name)) return true;
+      count++;
+      return !search.singleShot;
+   });
+   switch (walk.end) {
+   case WalkEnd::ListFailed:
+      std::fprintf(stderr, "CartelList: error fetching cartel list 0x%x\n", walk.status);
+      return 0;
+   case WalkEnd::AppendFailed:
+      return 0;
+   case WalkEnd::Done:
+   case WalkEnd::Stopped:
+      break;
    }
    return count;
 }

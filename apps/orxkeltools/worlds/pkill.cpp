@@ -47,7 +47,7 @@ KEL_Status SignalCartel(const CartelSeen &seen, void *context) {
    // pkill never signals itself.  An ID below 1 names no single process: kill
    // would signal a whole process group (or every process) instead.
    if (id == killing.self || id <= 0) return KEL_STATUS_OK;
-   if (kill(id, killing.signal) != 0 && errno != ESRCH) {
+   if (OrxProc_Signal(id, killing.signal) != 0 && errno != ESRCH) {
       std::fprintf(stderr, "pkill: failed to kill %s (%d): %s\n", seen.text, id, std::strerror(errno));
       return KEL_STATUS_FAILURE;
    }

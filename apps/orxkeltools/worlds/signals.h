@@ -5,6 +5,7 @@
 #ifndef ORXKELTOOLS_WORLDS_SIGNALS_H
 #define ORXKELTOOLS_WORLDS_SIGNALS_H
 
+#include <span>
 #include <string_view>
 
 struct SignalName {
@@ -21,9 +22,9 @@ inline constexpr SignalName kSignalNames[] = {
    {"WINCH", 28},  {"POLL", 29},  {"IO", 29},   {"PWR", 30},    {"INFO", 30},  {"SYS", 31},
 };
 
-// The number of the first row named name, or 0 when no row is.
-constexpr int SignalByName(std::string_view name) {
-   for (const SignalName &row : kSignalNames)
+// The number of the first row of table named name, or 0 when no row is.
+constexpr int SignalByName(std::string_view name, std::span<const SignalName> table = kSignalNames) {
+   for (const SignalName &row : table)
       if (row.name == name) return row.number;
    return 0;
 }

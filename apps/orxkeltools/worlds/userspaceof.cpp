@@ -32,26 +32,23 @@ int UserspaceofMain(int argc, char **argv) {
       std::fputs("CartelList: Not enough memory\n", stderr);
       return 1;
    }
-   ParamListPtr worlds;
-   KEL_Status status = GetInstanceList(KEL_NODE_world, nullptr, &worlds);
-   if (status != KEL_STATUS_OK) {
-      std::fprintf(stderr, "CartelList: error fetching cartel list 0x%x\n", status);
-      return 1;
-   }
-
    // Every world is read: the walk does not stop at the first hit.
    unsigned printed = 0;
-   uint32_t n = KEL_ParamListUsedCount(worlds.get());
-   for (uint32_t i = 0; i < n; i++) {
-      if (!AddParamToList(KEL_ParamListGetParam(worlds.get(), i), keys.get())) return 1;
+   WalkResult walk = ForEachInstance(KEL_NODE_world, keys.get(), [&](const KEL_Param *) {
       uint8_t info[worldinfo::kSize];
       if (KEL_Get(KEL_NODE_world_info, keys.get(), info, sizeof info) == KEL_STATUS_OK &&
           ReadU32(info, worldinfo::kWorldId) == worldId) {
          std::printf("%d ", ReadI32(info, worldinfo::kUserspaceId));
          printed++;
       }
-      KEL_ParamListRemoveLastParam(keys.get());
+      return true;
+   });
+   if (walk.end == WalkEnd::ListFailed) {
+      std::fprintf(stderr, "CartelList: error fetching cartel list 0x%x\n", walk.status);
+      return 1;
    }
+   // A key that cannot be appended ends the command; what was printed stays.
+   if (walk.end != WalkEnd::Done) return 1;
    if (printed == 0) return 1;
    std::putchar('\n');
    return 0;
