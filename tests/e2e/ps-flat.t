@@ -25,6 +25,15 @@ sleep, cat, vmx with two zombies) and userspace 2 (init, logger-daemon).
                                      "processGroupId": 123, "sessionId": 4, "userspaceId": 1}},
    "12345": {"name": "big", "info": {"worldId": 12345, "groupId": -5}}},
   "userworld": {"cartel": {"123": {"cmdline": "x"}}}}}
+=== snapshot clone-first extends host
+{"tree": {"world": {"7001": {"name": "job-worker",
+                             "info": {"worldId": 7001, "userspaceId": 2, "cartelId": 7000, "parentCartelId": 2001,
+                                      "type": 36}},
+                    "7000": {"name": "job",
+                             "info": {"worldId": 7000, "userspaceId": 2, "cartelId": 7000, "parentCartelId": 2001,
+                                      "processGroupId": 7000, "sessionId": 2001, "type": 4}}},
+          "userworld": {"cartel": {"7000": {"cmdline": "job", "child": {"7100": {"state": 1}, "7101": {"state": 0},
+                                                                        "7102": {"state": 1}}}}}}}
 === case no options: WID, CID and WorldName of every world, then an empty line
 snapshot: host
 run: ps
@@ -182,6 +191,23 @@ WID   CID   WorldName      GID  PGID  SID  PCID  Type    State   Wait    CPU   T
 Total worlds:         11
 Total printed worlds: 11
 Zombie worlds:        3
+Total userspaces:     2
+=== case a cartel's main world keeps its zombies when another of its worlds is listed first
+snapshot: clone-first
+run: ps -z -U2 -g -i
+exit: 0
+--- stdout
+WID   CID   WorldName      PGID  SID  UserSpace
+2001  2001  init           2001  2001  2        
+2050  2050  logger-daemon  2001  2001  2        
+7001  7000  job-worker     0  0  2        
+7000  7000  job            7000  2001  2        
+7100  7100  <zombie>       7000  2001
+7102  7102  <zombie>       7000  2001
+
+Total worlds:         13
+Total printed worlds: 13
+Zombie worlds:        5
 Total userspaces:     2
 === case -C lists the main world of every cartel
 snapshot: host
