@@ -23,6 +23,11 @@ The snapshots patch ps-worlds.json (see ps-flat.t).
 {"tree": {"userworld": {"cartel": {"2050": {"child": {"$listStatus": "0xbad0062"}}}}}}
 === snapshot middle-children-fail extends host
 {"tree": {"userworld": {"cartel": {"1300": {"child": {"$listStatus": "0xbad0062"}}}}}}
+=== snapshot late-clone-children-fail extends host
+{"tree": {"world": {"1102": {"name": "sh-late",
+                             "info": {"worldId": 1102, "userspaceId": 1, "cartelId": 1100, "parentCartelId": 1001,
+                                      "type": 36}}},
+          "userworld": {"cartel": {"1100": {"child": {"$listStatus": "0xbad0062"}}}}}}
 === snapshot child-record-fails extends host
 {"tree": {"userworld": {"cartel": {"1300": {"child": {"1351": {"$status": "0xbad0062"}}}}}}}
 === snapshot child-id-text extends host
@@ -154,6 +159,22 @@ exit: 0
 2
 \x0em\x0f\x0eq\x0f2001  2001  init         
   \x0em\x0f\x0eq\x0f2050  2050  logger-daemon
+
+=== case a failed child listing counts again at a later world of the same cartel
+snapshot: late-clone-children-fail
+run: ps -z -U1
+exit: 1
+--- stdout
+WID   CID   WorldName      UserSpace
+1001  1001  init           1        
+1100  1100  sh             1        
+1101  1100  sh-worker      1        
+1200  1200  sleep          1        
+1210  1210  cat            1        
+1300  1300  vmx            1        
+1350  1350  <zombie>     
+1351  1351  <zombie>     
+1102  1100  sh-late        1        
 
 === case a child record that cannot be read ends ps before any output
 snapshot: child-record-fails

@@ -1,9 +1,10 @@
 ps --tree: the line-drawing set-up, one header and tree per userspace, the
 glyphs of a three-level tree whose vertical lines depend on siblings still
 to come, zombies, nThreads of a parent with a clone, the userspace root
-table (two roots of one userspace, userspace 128, the not-running report)
-and trees from a damaged cache: a cycle through a world whose ID is 0 and
-a chain deeper than the drawing goes.
+table (two roots of one userspace, userspace 128, the not-running report),
+a valid chain of more than a thousand cartels, drawn whole, the first of
+two worlds with the same world ID as the parent, and a tree from a damaged
+cache: a cycle through a world whose ID is 0.
 
 === snapshot host from ps-worlds.json
 === snapshot two-roots extends host
@@ -63,6 +64,17 @@ a chain deeper than the drawing goes.
                            "11": {"cmdline": "child", "child": {}},
                            "20": {"cmdline": "a", "child": {}},
                            "21": {"cmdline": "b", "child": {}}}}}}
+=== snapshot twin-parents
+{"buildDate": "Nov 30 2026",
+ "tree": {"world": {
+   "10": {"name": "init", "info": {"worldId": 10, "userspaceId": 1, "cartelId": 10}},
+   "40": {"name": "child", "info": {"worldId": 40, "userspaceId": 1, "cartelId": 40, "parentCartelId": 30}},
+   "30": {"name": "first", "info": {"worldId": 30, "userspaceId": 1, "cartelId": 30, "parentCartelId": 10}},
+   "31": {"name": "second", "info": {"worldId": 30, "userspaceId": 1, "cartelId": 31, "parentCartelId": 10}}},
+  "userworld": {"cartel": {"10": {"cmdline": "init", "child": {}}, "30": {"cmdline": "a", "child": {}},
+                           "31": {"cmdline": "b", "child": {}}, "40": {"cmdline": "c", "child": {}}}}}}
+=== snapshot chain
+{"buildDate": "Nov 30 2026", "tree": @CHAIN}
 === snapshot example from ../../examples/host.json
 === case --tree: the line-drawing set-up, then one header and tree per userspace
 snapshot: host
@@ -161,14 +173,6 @@ Total printed worlds: 8
 Deepest child:        2
 Zombie worlds:        3
 Total userspaces:     2
-=== case -J with a userspace that is not running prints no tree
-snapshot: host
-run: ps -J -U9 -i
-exit: 1
---- stderr
-Requested userspace (9) is not running.
-Available userspaces:
-   1   2 
 === case the later root of a userspace wins; userspace 128 is warned about and not drawn
 snapshot: two-roots
 run: ps -J -c -i
@@ -261,16 +265,27 @@ Total printed worlds: 5
 Deepest child:        3
 Zombie worlds:        0
 Total userspaces:     1
-=== case a chain deeper than the drawing goes is cut, with a message
-setup: python3 -c 'import json; n=3000; print(json.dumps({"buildDate": "Nov 30 2026", "tree": {"world": {str(i): {"name": "w%d" % i, "info": {"worldId": i, "userspaceId": 1, "cartelId": i, "parentCartelId": i - 1}} for i in range(1, n + 1)}, "userworld": {"cartel": {str(i): {"cmdline": "x", "child": {}} for i in range(1, n + 1)}}}}))' > deep.json
-setup: @BIN/kelcache build deep.json -o deep.cache
-argv: orxkeltools -c @TMP/deep.cache ps -J -i
-check: @BIN/orxkeltools -c @TMP/deep.cache ps -J -i | grep -q '^Deepest child:        1024$'
-check: test "$(@BIN/orxkeltools -c @TMP/deep.cache ps -J | grep -c ' w[0-9]')" = 1024
-exit: 1
+=== case a chain of 1113 cartels is drawn whole, each level two columns further in
+value: CHAIN python3 -c 'import json; n = 1113; print(json.dumps({"world": {str(i): {"name": "w%d" % i, "info": {"worldId": i, "userspaceId": 1, "cartelId": i, "parentCartelId": i - 1}} for i in range(1, n + 1)}, "userworld": {"cartel": {str(i): {"cmdline": "x", "child": {}} for i in range(1, n + 1)}}}))'
+snapshot: chain
+run: ps -J -i
+check: @BIN/orxkeltools -c @CACHE ps -J -i > out && grep -qx 'Deepest child:        1113' out
+check: python3 -c 'import sys; rows = [l for l in open("out", encoding="latin-1") if "\x0eq" in l]; sys.exit(not (len(rows) == 1113 and all(r.startswith(" " * 2 * i + "\x0em\x0f\x0eq\x0f%-4d" % (i + 1)) for i, r in enumerate(rows))))'
+exit: 0
 --- stdout (any)
---- stderr
-ps: cartel trees deeper than 1024 levels are cut
+=== case of two worlds with the parent's world ID, the first listed is the parent
+snapshot: twin-parents
+run: ps -J -n -P
+exit: 0
+--- stdout (escaped)
+\x1b)0
+  WID  CID  WorldName  nChildren  PCID
+1
+\x0em\x0f\x0eq\x0f10  10  init    2          0 
+  \x0et\x0f\x0eq\x0f30  30  first   1          10
+  \x0ex\x0f \x0em\x0f\x0eq\x0f40  40  child   0          30
+  \x0em\x0f\x0eq\x0f30  31  second  0          10
+
 === case the example host
 snapshot: example
 run: ps -J -c -s -T

@@ -13,12 +13,13 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
-#include <memory>
 #include <string_view>
 
 #include "keltools.h"
 #include "numbers.h"
 #include "records.h"
+#include "worlds/psparents.h"
+#include "worlds/schedrecords.h"
 #include "worlds/worldinfo.h"
 
 namespace {
@@ -114,32 +115,10 @@ constexpr uint32_t kCloneWorld = 0x20;
 // Userspace IDs with a root table entry run from 1 to this.
 constexpr uint32_t kMaxUserspace = 127;
 
-// Trees are drawn this many levels deep at most, so that a damaged tree
-// (a chain of a million cartels) cannot exhaust the stack or flood the
-// terminal with indentation.
-constexpr int kMaxTreeDepth = 1024;
-
-// Record sizes and the offsets read from them:
-//
-//   scheduler summary (248):  4 run-state number u32, 8 wait-state number u32
-//   affinity (2304):          0 a text, printed in the CPU column
-//   state times (120):        8 used time u64, microseconds
-//   cartel child (28):        4 child state u32 (1: zombie)
-constexpr uint32_t kSummarySize = 248;
-constexpr size_t kRunState = 4;
-constexpr size_t kWaitState = 8;
-constexpr uint32_t kAffinitySize = 2304;
-constexpr uint32_t kStateTimesSize = 120;
-constexpr size_t kUsedTime = 8;
-constexpr uint32_t kChildSize = 28;
-constexpr size_t kChildState = 4;
-constexpr uint32_t kChildZombie = 1;
-
-struct FreeDeleter {
-   void operator()(void *p) const { std::free(p); }
-};
-template <class T>
-using MallocPtr = std::unique_ptr<T[], FreeDeleter>;
+bool OutOfMemory() {
+   std::fputs("WorldList: Not enough memory\n", stderr);
+   return false;
+}
 
 // A text kept in the text pool.
 struct TextRef {
@@ -155,14 +134,7 @@ struct TextPool {
    size_t room = 0;
 
    bool Add(std::string_view text, TextRef *ref) {
-      if (text.size() > room - used) {
-         size_t want = std::max(used + text.size(), 2 * room + 4096);
-         void *grown = std::realloc(bytes.get(), want);
-         if (grown == nullptr) return false;
-         (void)bytes.release();
-         bytes.reset(static_cast<char *>(grown));
-         room = want;
-      }
+      if (text.size() > SIZE_MAX - used || !GrowArray(&bytes, &room, used + text.size())) return false;
       if (!text.empty()) std::memcpy(bytes.get() + used, text.data(), text.size());
       *ref = {used, uint32_t(text.size())};
       used += text.size();
@@ -188,16 +160,13 @@ struct WorldNode {
    uint64_t usedTime;
    int32_t nChildren;
    int32_t nThreads;
-   int32_t printedChildren;
    int32_t parent;
    int32_t firstChild;
    int32_t lastChild;
    int32_t nextSibling;
    // This world's zombies: zombieCount entries of the zombie array from zombieFirst.
    uint32_t zombieFirst;
-   int32_t zombieCount;
-   // Userspace of the tree that last drew this node, so a cycle is drawn once.
-   uint32_t drawnInTree;
+   uint32_t zombieCount;
 };
 
 WorldNode NewNode() {
@@ -212,20 +181,20 @@ uint32_t ParentCartelId(const WorldNode &n) { return ReadU32(n.info, worldinfo::
 uint32_t UserspaceId(const WorldNode &n) { return ReadU32(n.info, worldinfo::kUserspaceId); }
 uint32_t TypeBits(const WorldNode &n) { return ReadU32(n.info, worldinfo::kTypeBits); }
 
-void StoreU32(uint8_t *rec, size_t off, uint32_t value) {
-   for (int i = 0; i < 4; i++) rec[off + i] = uint8_t(value >> (8 * i));
-}
-
-// Everything WorldList gathers, and what the printing adds to it.
-struct Gathering {
+// What WorldList gathers: the nodes, their texts, the userspace roots and
+// the counts the summary prints.  The printing only reads it.
+struct WorldTable {
    uint32_t options = 0;
-   uint32_t requestedUserspace = 0;
    TextPool texts;
+   // Kept worlds in instance order, and the zombies they keep.
    MallocPtr<WorldNode> gathered;
+   size_t gatheredRoom = 0;
    MallocPtr<WorldNode> zombies;
-   uint32_t zombieRoom = 0;
+   size_t zombieRoom = 0;
+   // Each kept world followed by its zombies, linked into trees on request.
    MallocPtr<WorldNode> allNodes;
    uint32_t allCount = 0;
+   // The node in allNodes of each userspace's root cartel, -1 for none.
    int32_t roots[kMaxUserspace + 1];
    KEL_Status latest = KEL_STATUS_OK;
    int totalWorlds = 0;
@@ -233,37 +202,70 @@ struct Gathering {
    int zombiesFound = 0;
    uint32_t largestWorldId = 0;
    uint32_t longestName = 0;
-   // Printing.
-   int idWidth = 1;
-   int deepest = 0;
-   bool treeCut = false;
 };
-
-bool OutOfMemory() {
-   std::fputs("WorldList: Not enough memory\n", stderr);
-   return false;
-}
 
 // --- Gathering -------------------------------------------------------------
 
-// Makes room in the zombie array for count more zombies.
-bool ReserveZombies(Gathering &g, uint32_t count) {
-   uint32_t used = uint32_t(g.zombiesFound);
-   if (count <= g.zombieRoom - used) return true;
-   size_t want = std::max<size_t>(size_t(used) + count, 2 * size_t(g.zombieRoom));
-   if (want > UINT32_MAX || want > SIZE_MAX / sizeof(WorldNode)) return false;
-   void *grown = std::realloc(g.zombies.get(), want * sizeof(WorldNode));
-   if (grown == nullptr) return false;
-   (void)g.zombies.release();
-   g.zombies.reset(static_cast<WorldNode *>(grown));
-   g.zombieRoom = uint32_t(want);
-   return true;
+// A map from cartel ID to a number: a trie over the ID's eight hexadecimal
+// digits, its nodes in one growable table, so that a lookup takes eight
+// steps whatever the IDs are.  Node 0 is the root, so 0 also means "no node"
+// (and, in the last level, "no number yet").
+struct CartelIndex {
+   struct Node {
+      uint32_t next[16];
+   };
+   MallocPtr<Node> nodes;
+   size_t room = 0;
+   uint32_t used = 0;
+
+   // The slot holding id's number, 0 until it is set; the nodes on the way
+   // are made when missing.  nullptr when memory runs out.  The slot stays
+   // valid until the next call.
+   uint32_t *Slot(uint32_t id) {
+      if (used == 0) {
+         if (!GrowArray(&nodes, &room, 1)) return nullptr;
+         used = 1;
+      }
+      uint32_t at = 0;
+      for (int shift = 28; shift > 0; shift -= 4) {
+         uint32_t digit = (id >> shift) & 0xf;
+         if (nodes[at].next[digit] == 0) {
+            if (!GrowArray(&nodes, &room, size_t(used) + 1)) return nullptr;
+            nodes[at].next[digit] = used++;
+         }
+         at = nodes[at].next[digit];
+      }
+      return &nodes[at].next[id & 0xf];
+   }
+};
+
+// The children of the cartels met so far.  A cartel's children are read at
+// the first of its worlds; its other worlds take the listing's status and
+// the zombies from here instead of reading them again.
+struct CartelChildren {
+   struct Entry {
+      KEL_Status listStatus;
+      uint32_t firstZombie;  // into zombieIds
+      uint32_t zombieCount;
+   };
+   CartelIndex index;  // cartel ID -> entry number + 1
+   MallocPtr<Entry> entries;
+   size_t entryRoom = 0;
+   uint32_t entryCount = 0;
+   MallocPtr<int32_t> zombieIds;
+   size_t zombieIdRoom = 0;
+   uint32_t zombieIdCount = 0;
+};
+
+bool NoZombieMemory() {
+   std::fputs("failed to allocate array for zombies\n", stderr);
+   return false;
 }
 
-// Reads the children of cartel C and keeps those that are zombies as nodes
-// of world w, when w is the cartel's main world.  Every world of the cartel
-// reads the children; only the main world records them.
-bool GatherZombies(Gathering &g, WorldNode &w, uint32_t cartel) {
+// Lists the children of cartel C, reads each child's record and remembers
+// the listing's status and the zombies among them as a new entry.  A failed
+// listing yields no children.
+bool ReadChildren(CartelChildren &seen, uint32_t cartel) {
    ParamListPtr childKeys(KEL_ParamListCreate(1, 1));
    if (!childKeys) {
       std::fputs("failed to alloc paramlist for children\n", stderr);
@@ -273,19 +275,15 @@ bool GatherZombies(Gathering &g, WorldNode &w, uint32_t cartel) {
       std::fputs("failed to add int to child param list\n", stderr);
       return false;
    }
-   KEL_ParamList *listed = nullptr;
-   g.latest = GetInstanceList(KEL_NODE_userworld_cartel_child, childKeys.get(), &listed);
-   // A failed listing yields no children.
-   ParamListPtr children(g.latest == KEL_STATUS_OK ? listed : nullptr);
+   ParamListPtr children;
+   KEL_Status listStatus = GetInstanceList(KEL_NODE_userworld_cartel_child, childKeys.get(), &children);
    childKeys.reset();
 
-   uint32_t count = KEL_ParamListUsedCount(children.get());
-   if (count > 0 && !ReserveZombies(g, count)) {
-      std::fputs("failed to allocate array for zombies\n", stderr);
-      return false;
-   }
-   w.zombieFirst = uint32_t(g.zombiesFound);
-   bool mainWorld = cartel == WorldId(w);
+   uint32_t count = listStatus == KEL_STATUS_OK ? KEL_ParamListUsedCount(children.get()) : 0;
+   if (!GrowArray(&seen.entries, &seen.entryRoom, size_t(seen.entryCount) + 1) ||
+       (count > 0 && !GrowArray(&seen.zombieIds, &seen.zombieIdRoom, size_t(seen.zombieIdCount) + count)))
+      return NoZombieMemory();
+   CartelChildren::Entry entry{listStatus, seen.zombieIdCount, 0};
    for (uint32_t i = 0; i < count; i++) {
       int32_t childId;
       if (KEL_ParamListGetInt32(children.get(), i, &childId) != KEL_STATUS_OK) {
@@ -305,23 +303,49 @@ bool GatherZombies(Gathering &g, WorldNode &w, uint32_t cartel) {
          std::fputs("failed to add child ID to list\n", stderr);
          return false;
       }
-      uint8_t child[kChildSize];
+      uint8_t child[cartelchild::kSize];
       KEL_Status status = KEL_Get(KEL_NODE_userworld_cartel_child, keys.get(), child, sizeof child);
       if (status != KEL_STATUS_OK) {
          std::fprintf(stderr, "failed to get child info for child %d, status %s\n", childId,
                       ORX_ReturnStatusToString(status));
          return false;
       }
-      if (ReadU32(child, kChildState) != kChildZombie || !mainWorld) continue;
+      if (ReadU32(child, cartelchild::kState) != cartelchild::kZombie) continue;
+      seen.zombieIds[seen.zombieIdCount++] = childId;
+      entry.zombieCount++;
+   }
+   seen.entries[seen.entryCount++] = entry;
+   return true;
+}
+
+// The children of world w's cartel C: read at the cartel's first world,
+// taken from what was read for the others.  Either way the listing's status
+// becomes the latest status, and w keeps the zombies as nodes when it is the
+// cartel's main world (its world ID is C).
+bool GatherZombies(WorldTable &t, CartelChildren &seen, WorldNode &w, uint32_t cartel) {
+   uint32_t *slot = seen.index.Slot(cartel);
+   if (slot == nullptr) return NoZombieMemory();
+   if (*slot == 0) {
+      if (!ReadChildren(seen, cartel)) return false;
+      *slot = seen.entryCount;
+   }
+   const CartelChildren::Entry &entry = seen.entries[*slot - 1];
+   t.latest = entry.listStatus;
+   if (cartel != WorldId(w) || entry.zombieCount == 0) return true;
+
+   if (!GrowArray(&t.zombies, &t.zombieRoom, size_t(t.zombiesFound) + entry.zombieCount)) return NoZombieMemory();
+   w.zombieFirst = uint32_t(t.zombiesFound);
+   for (uint32_t i = 0; i < entry.zombieCount; i++) {
+      uint32_t childId = uint32_t(seen.zombieIds[entry.firstZombie + i]);
       WorldNode z = NewNode();
       z.isZombie = true;
-      StoreU32(z.info, worldinfo::kWorldId, uint32_t(childId));
-      StoreU32(z.info, worldinfo::kCartelId, uint32_t(childId));
-      StoreU32(z.info, worldinfo::kParentCartelId, cartel);
+      PutU32(z.info, worldinfo::kWorldId, childId);
+      PutU32(z.info, worldinfo::kCartelId, childId);
+      PutU32(z.info, worldinfo::kParentCartelId, cartel);
       std::memcpy(z.info + worldinfo::kUserspaceId, w.info + worldinfo::kUserspaceId, 4);
       std::memcpy(z.info + worldinfo::kProcessGroupId, w.info + worldinfo::kProcessGroupId, 4);
       std::memcpy(z.info + worldinfo::kSessionId, w.info + worldinfo::kSessionId, 4);
-      g.zombies[g.zombiesFound++] = z;
+      t.zombies[t.zombiesFound++] = z;
       w.zombieCount++;
    }
    return true;
@@ -329,127 +353,169 @@ bool GatherZombies(Gathering &g, WorldNode &w, uint32_t cartel) {
 
 enum class Gathered { Kept, Skipped, Failed };
 
-// Reads the world whose key is on the key list into n.
-Gathered ReadWorld(Gathering &g, KEL_ParamList *keys, WorldNode &n) {
+// Reads the world whose key is on keys into n.  A cartel's command line is
+// read with the cartel ID on cartelKeys, an empty key list of its own.
+Gathered ReadWorld(WorldTable &t, CartelChildren &seen, const KEL_ParamList *keys, KEL_ParamList *cartelKeys,
+                   WorldNode &n) {
    uint8_t name[kWorldNameSize];
    if (KEL_Get(KEL_NODE_world_name, keys, name, sizeof name) != KEL_STATUS_OK ||
        KEL_Get(KEL_NODE_world_info, keys, n.info, sizeof n.info) != KEL_STATUS_OK)
       return Gathered::Skipped;
 
-   uint8_t summary[kSummarySize], affinity[kAffinitySize], times[kStateTimesSize];
+   uint8_t summary[summarystats::kSize], cpus[affinity::kSize], times[statetimes::kSize];
    if (KEL_Get(KEL_NODE_sched_Vcpus_stats_summaryStats, keys, summary, sizeof summary) == KEL_STATUS_OK &&
-       KEL_Get(KEL_NODE_sched_Vcpus_stats_affinity, keys, affinity, sizeof affinity) == KEL_STATUS_OK) {
+       KEL_Get(KEL_NODE_sched_Vcpus_stats_affinity, keys, cpus, sizeof cpus) == KEL_STATUS_OK) {
       if (KEL_Get(KEL_NODE_sched_Vcpus_stats_stateTimes, keys, times, sizeof times) != KEL_STATUS_OK)
          return Gathered::Skipped;
       n.schedValid = true;
    }
 
    uint32_t cartel = CartelId(n);
-   if ((g.options & kOptUserworlds) && cartel == 0) return Gathered::Skipped;
+   if ((t.options & kOptUserworlds) && cartel == 0) return Gathered::Skipped;
 
    std::string_view nameText = ReadText(name, 0, sizeof name);
-   g.longestName = std::max(g.longestName, uint32_t(nameText.size()));
-   g.largestWorldId = std::max(g.largestWorldId, WorldId(n));
+   t.longestName = std::max(t.longestName, uint32_t(nameText.size()));
+   t.largestWorldId = std::max(t.largestWorldId, WorldId(n));
    if (n.schedValid) {
-      n.runState = ReadU32(summary, kRunState);
-      n.waitState = ReadU32(summary, kWaitState);
-      n.usedTime = ReadU64(times, kUsedTime);
+      n.runState = ReadU32(summary, summarystats::kRunState);
+      n.waitState = ReadU32(summary, summarystats::kWaitState);
+      n.usedTime = ReadU64(times, statetimes::kUsedTime);
    }
-   if (!g.texts.Add(nameText, &n.name) ||
-       (n.schedValid && !g.texts.Add(ReadText(affinity, 0, sizeof affinity), &n.affinity))) {
+   if (!t.texts.Add(nameText, &n.name) ||
+       (n.schedValid && !t.texts.Add(ReadText(cpus, affinity::kText, sizeof cpus), &n.affinity))) {
       OutOfMemory();
       return Gathered::Failed;
    }
+   if (cartel == 0) return Gathered::Kept;
 
-   if (cartel != 0) {
-      // The command line is read under the cartel ID in place of the world key.
-      KEL_ParamListRemoveLastParam(keys);
-      KEL_Status status = KEL_ParamListAddInt(keys, cartel);
-      uint8_t cmdline[kCmdlineSize];
-      if (status == KEL_STATUS_OK)
-         status = KEL_Get(KEL_NODE_userworld_cartel_cmdline, keys, cmdline, sizeof cmdline);
-      g.latest = status;
-      std::string_view text =
-         status == KEL_STATUS_OK ? ReadText(cmdline, 0, sizeof cmdline) : std::string_view("<unavailable>");
-      if (!g.texts.Add(text, &n.cmdline)) {
-         OutOfMemory();
-         return Gathered::Failed;
-      }
-      if ((g.options & kOptZombies) && !GatherZombies(g, n, cartel)) return Gathered::Failed;
+   ScopedKey cartelKey(cartelKeys, cartel);
+   uint8_t cmdline[kCmdlineSize];
+   // Appending to the list's reserved room fails only when memory runs out.
+   KEL_Status status = cartelKey.ok()
+                          ? KEL_Get(KEL_NODE_userworld_cartel_cmdline, cartelKeys, cmdline, sizeof cmdline)
+                          : KEL_Status(KEL_STATUS_NO_MEMORY);
+   t.latest = status;
+   std::string_view text =
+      status == KEL_STATUS_OK ? ReadText(cmdline, 0, sizeof cmdline) : std::string_view("<unavailable>");
+   if (!t.texts.Add(text, &n.cmdline)) {
+      OutOfMemory();
+      return Gathered::Failed;
    }
+   if ((t.options & kOptZombies) && !GatherZombies(t, seen, n, cartel)) return Gathered::Failed;
    return Gathered::Kept;
+}
+
+// Reads every world (with -C, the main world of every cartel) into the
+// gathered array.  False, with a message, when ps must stop.
+bool GatherWorlds(WorldTable &t) {
+   ParamListPtr keys(KEL_ParamListCreate(1, 1));
+   ParamListPtr cartelKeys(KEL_ParamListCreate(1, 1));
+   if (!keys || !cartelKeys) return OutOfMemory();
+   CartelChildren seen;
+   KEL_Node listNode = (t.options & kOptCartels) ? KEL_NODE_userworld_cartel : KEL_NODE_world;
+   WalkResult walk = ForEachInstance(listNode, keys.get(), [&](const KEL_Param *) {
+      t.totalWorlds++;
+      WorldNode n = NewNode();
+      n.nThreads = 1;
+      Gathered result = ReadWorld(t, seen, keys.get(), cartelKeys.get(), n);
+      if (result == Gathered::Kept) {
+         if (!GrowArray(&t.gathered, &t.gatheredRoom, size_t(t.keptWorlds) + 1)) {
+            std::fputs("WorldList: malloc failed when allocating root tree node\n", stderr);
+            result = Gathered::Failed;
+         } else {
+            t.gathered[t.keptWorlds++] = n;
+         }
+      }
+      return result != Gathered::Failed;
+   });
+   if (walk.end == WalkEnd::ListFailed)
+      std::fprintf(stderr, "WorldList: error fetching world list 0x%x\n", walk.status);
+   return walk.end == WalkEnd::Done;
 }
 
 // Lays out allNodes (each kept world followed by its zombies) and registers
 // the root cartel of every userspace.
-bool BuildAllNodes(Gathering &g) {
-   size_t count = size_t(g.keptWorlds) + size_t(g.zombiesFound);
-   g.allNodes.reset(static_cast<WorldNode *>(std::calloc(std::max<size_t>(count, 1), sizeof(WorldNode))));
-   if (!g.allNodes) {
+bool BuildAllNodes(WorldTable &t) {
+   t.allNodes = AllocArray<WorldNode>(size_t(t.keptWorlds) + size_t(t.zombiesFound));
+   if (!t.allNodes) {
       std::fputs("WorldList: malloc failed when allocating allNodes list\n", stderr);
       return false;
    }
-   std::fill(std::begin(g.roots), std::end(g.roots), -1);
+   std::fill(std::begin(t.roots), std::end(t.roots), -1);
    uint32_t n = 0;
-   for (int i = 0; i < g.keptWorlds; i++) {
-      const WorldNode &w = g.gathered[i];
-      g.allNodes[n] = w;
+   for (int i = 0; i < t.keptWorlds; i++) {
+      const WorldNode &w = t.gathered[i];
+      t.allNodes[n] = w;
       uint32_t userspace = UserspaceId(w);
       if (userspace != 0 && ParentCartelId(w) == 0) {
          if (userspace > kMaxUserspace)
             std::fputs("Warning: maximum number of userspaces reached...\n", stderr);
          else
-            g.roots[userspace] = int32_t(n);
+            t.roots[userspace] = int32_t(n);
       }
       n++;
-      for (int z = 0; z < w.zombieCount; z++) g.allNodes[n++] = g.zombies[w.zombieFirst + z];
+      for (uint32_t z = 0; z < w.zombieCount; z++) t.allNodes[n++] = t.zombies[w.zombieFirst + z];
    }
-   g.allCount = n;
+   t.allCount = n;
    return true;
 }
 
-struct ParentEntry {
-   uint32_t worldId;
-   int32_t index;
-};
+// Links every cartel node at the end of its parent's child chain.
+bool LinkTree(WorldTable &t) {
+   WorldNode *nodes = t.allNodes.get();
+   MallocPtr<psparents::NodeIds> ids = AllocArray<psparents::NodeIds>(t.allCount);
+   MallocPtr<int32_t> parents = AllocArray<int32_t>(t.allCount);
+   if (!ids || !parents) return OutOfMemory();
+   for (uint32_t i = 0; i < t.allCount; i++)
+      ids[i] = {WorldId(nodes[i]), CartelId(nodes[i]), ParentCartelId(nodes[i])};
+   if (!psparents::FindParents(ids.get(), t.allCount, parents.get())) return OutOfMemory();
 
-// Links every cartel node under the first node in allNodes whose cartel ID
-// is not 0 and whose world ID is the node's parent cartel ID.  Those
-// candidates are sorted by world ID and then position, so a binary search
-// finds that first node.
-bool LinkTree(Gathering &g) {
-   WorldNode *nodes = g.allNodes.get();
-   MallocPtr<ParentEntry> parents(
-      static_cast<ParentEntry *>(std::calloc(std::max<size_t>(g.allCount, 1), sizeof(ParentEntry))));
-   if (!parents) return OutOfMemory();
-   uint32_t candidates = 0;
-   for (uint32_t i = 0; i < g.allCount; i++)
-      if (CartelId(nodes[i]) != 0) parents[candidates++] = {WorldId(nodes[i]), int32_t(i)};
-   auto byWorldThenIndex = [](const ParentEntry &a, const ParentEntry &b) {
-      return a.worldId != b.worldId ? a.worldId < b.worldId : a.index < b.index;
-   };
-   ParentEntry *begin = parents.get(), *end = parents.get() + candidates;
-   std::sort(begin, end, byWorldThenIndex);
-
-   for (uint32_t i = 0; i < g.allCount; i++) {
+   for (uint32_t i = 0; i < t.allCount; i++) {
+      int32_t p = parents[i];
+      if (p < 0) continue;
       WorldNode &child = nodes[i];
-      if (CartelId(child) == 0) continue;
-      ParentEntry *p = std::lower_bound(begin, end, ParentEntry{ParentCartelId(child), -1}, byWorldThenIndex);
-      if (p == end || p->worldId != ParentCartelId(child)) continue;
-      WorldNode &parent = nodes[p->index];
+      WorldNode &parent = nodes[p];
       if (parent.firstChild < 0)
          parent.firstChild = int32_t(i);
       else
          nodes[parent.lastChild].nextSibling = int32_t(i);
       parent.lastChild = int32_t(i);
       parent.nChildren++;
-      child.parent = p->index;
+      child.parent = p;
       if (TypeBits(child) & kCloneWorld) parent.nThreads++;
    }
    return true;
 }
 
 // --- Printing --------------------------------------------------------------
+
+// Where a node stands in the drawing of the trees.
+struct DrawnNode {
+   int32_t printedChildren;
+   // Userspace of the tree that last drew this node, so a cycle is drawn once.
+   uint32_t inTree;
+};
+
+// A node on the path from the root of the tree being drawn, and the next of
+// its children to draw (-1 when all are done).
+struct PathStep {
+   int32_t node;
+   int32_t nextChild;
+};
+
+// The printing's own state; the gathered table is only read.
+struct Printer {
+   const WorldTable &t;
+   uint32_t requestedUserspace;
+   int idWidth = 1;
+   int deepest = 0;
+   // Tree layout only: one entry per node of allNodes, and the path from
+   // the root to the node being drawn, which grows with the depth.
+   MallocPtr<DrawnNode> drawn;
+   MallocPtr<PathStep> path;
+   size_t pathRoom = 0;
+   uint32_t userspace = 0;
+};
 
 // Prints a formatted text followed by spaces up to width characters; a
 // longer text is printed whole.
@@ -462,9 +528,9 @@ __attribute__((format(printf, 2, 3))) void PrintPadded(int width, const char *fm
    std::printf("%-*s", std::max(width, 0), text);
 }
 
-void PrintPsHeader(const Gathering &g) {
-   uint32_t o = g.options;
-   int w = g.idWidth, m = int(g.longestName);
+void PrintPsHeader(const Printer &p) {
+   uint32_t o = p.t.options;
+   int w = p.idWidth, m = int(p.t.longestName);
    if (o & kOptTree) std::fputs("  ", stdout);
    std::printf("%-*s", w, "WID");
    std::printf("%-*s", w + 2, "  CID");
@@ -525,9 +591,10 @@ const char *StateName(const CpuSched_StateElement *table, uint32_t count, uint32
 // One row.  The row's ID paddings differ from the header's on purpose, and
 // a column whose condition fails prints nothing, so later columns shift
 // left on zombie rows and on rows without scheduler data.
-void PrintPsRow(const Gathering &g, const WorldNode &n) {
-   uint32_t o = g.options;
-   int w = g.idWidth, m = int(g.longestName);
+void PrintPsRow(const Printer &p, const WorldNode &n) {
+   const WorldTable &t = p.t;
+   uint32_t o = t.options;
+   int w = p.idWidth, m = int(t.longestName);
    bool zombie = n.isZombie;
    uint32_t cartel = CartelId(n);
    PrintPadded(w, "%d", int32_t(WorldId(n)));
@@ -538,7 +605,7 @@ void PrintPsRow(const Gathering &g, const WorldNode &n) {
    if (zombie) {
       std::printf("%-*s", m + 2, "  <zombie>");
    } else {
-      std::string_view name = g.texts.Get(n.name);
+      std::string_view name = t.texts.Get(n.name);
       std::printf("  %-*.*s", m, int(name.size()), name.data());
    }
    if ((o & kOptChildren) && (o & kOptTree) && !zombie) std::printf("  %-9d", n.nChildren);
@@ -559,7 +626,7 @@ void PrintPsRow(const Gathering &g, const WorldNode &n) {
       if (zombie || !n.schedValid) {
          std::fputs("                  ", stdout);
       } else {
-         std::string_view cpu = g.texts.Get(n.affinity);
+         std::string_view cpu = t.texts.Get(n.affinity);
          std::printf("  %-6.6s", StateName(CpuSched_RunStateElements, CpuSched_NumRunStates, n.runState));
          std::printf("  %-6.6s", StateName(CpuSched_WaitStateElements, CpuSched_NumWaitStates, n.waitState));
          std::printf("  %-4.*s", int(cpu.size()), cpu.data());
@@ -571,7 +638,7 @@ void PrintPsRow(const Gathering &g, const WorldNode &n) {
    if ((o & kOptSecurity) && !zombie) std::printf("  %-14d", ReadI32(n.info, worldinfo::kSecurityDomain));
    if ((o & kOptUserspace) && !zombie) std::printf("  %-9d", int32_t(UserspaceId(n)));
    if ((o & kOptCommand) && cartel != 0 && !zombie) {
-      std::string_view cmd = g.texts.Get(n.cmdline);
+      std::string_view cmd = t.texts.Get(n.cmdline);
       std::printf("  %.*s", int(cmd.size()), cmd.data());
    }
    std::fputs("\n", stdout);
@@ -580,30 +647,22 @@ void PrintPsRow(const Gathering &g, const WorldNode &n) {
 // A glyph of the DEC Special Graphics set, shifted in and out around it.
 void Glyph(char letter) { std::printf("%c%c%c", 14, letter, 15); }
 
-// The tree being drawn: the path from its root to the node being drawn.
-struct TreeDrawing {
-   Gathering &g;
-   uint32_t userspace;
-   int32_t path[kMaxTreeDepth];
-};
-
-// Draws one node and, depth first, its children.  The path holds the node's
-// ancestors, so the drawing never follows parent links upwards; a child
-// already drawn in this tree (a cycle in a damaged tree) is not drawn again.
-void PrintPsTree(TreeDrawing &d, int32_t index, int depth) {
-   WorldNode *nodes = d.g.allNodes.get();
-   WorldNode &n = nodes[index];
-   n.drawnInTree = d.userspace;
-   d.g.deepest = std::max(d.g.deepest, depth);
-   WorldNode *parent = depth > 0 ? &nodes[d.path[depth - 1]] : nullptr;
+// Prints the line of node index at the given depth: its tree prefix and its
+// row.  The first depth steps of the path are its ancestors, root first.
+void PrintTreeLine(Printer &p, int32_t index, size_t depth) {
+   const WorldNode *nodes = p.t.allNodes.get();
+   const WorldNode &n = nodes[index];
+   p.drawn[index].inTree = p.userspace;
+   p.deepest = std::max(p.deepest, int(depth));
+   int32_t parent = depth > 0 ? p.path[depth - 1].node : -1;
    if (depth == 0) std::printf("%d\n", int32_t(UserspaceId(n)));
-   if (parent != nullptr) {
+   if (parent >= 0) {
       std::fputs("  ", stdout);
       // One column per ancestor below the root: a line while the
       // ancestor's parent still has children to draw.
-      for (int i = 1; i < depth; i++) {
-         const WorldNode &above = nodes[d.path[i - 1]];
-         if (above.nChildren > 1 && above.nChildren != above.printedChildren) {
+      for (size_t i = 1; i < depth; i++) {
+         int32_t above = p.path[i - 1].node;
+         if (nodes[above].nChildren > 1 && nodes[above].nChildren != p.drawn[above].printedChildren) {
             Glyph('x');
             std::putchar(' ');
          } else {
@@ -611,31 +670,50 @@ void PrintPsTree(TreeDrawing &d, int32_t index, int depth) {
          }
       }
    }
-   bool last = n.nextSibling < 0 || parent == nullptr || parent->nChildren <= 1;
+   bool last = n.nextSibling < 0 || parent < 0 || nodes[parent].nChildren <= 1;
    Glyph(last ? 'm' : 't');
    Glyph('q');
-   PrintPsRow(d.g, n);
-   if (parent != nullptr) parent->printedChildren++;
-   if (n.firstChild < 0) return;
-   if (depth + 1 >= kMaxTreeDepth) {
-      d.g.treeCut = true;
-      return;
+   PrintPsRow(p, n);
+   if (parent >= 0) p.drawn[parent].printedChildren++;
+}
+
+// Draws the tree under root, depth first, each node before its children.
+// The path is an explicit stack on the heap, so a tree of any depth is
+// drawn whole; a child already drawn in this tree (a cycle in a damaged
+// tree) is passed over.  False when memory for the path runs out.
+bool PrintPsTree(Printer &p, int32_t root) {
+   const WorldNode *nodes = p.t.allNodes.get();
+   size_t depth = 0;
+   auto enter = [&](int32_t index) {
+      PrintTreeLine(p, index, depth);
+      if (nodes[index].firstChild < 0) return true;
+      if (!GrowArray(&p.path, &p.pathRoom, depth + 1)) return false;
+      p.path[depth++] = {index, nodes[index].firstChild};
+      return true;
+   };
+   if (!enter(root)) return false;
+   while (depth > 0) {
+      PathStep &step = p.path[depth - 1];
+      int32_t child = step.nextChild;
+      if (child < 0) {
+         depth--;
+         continue;
+      }
+      step.nextChild = nodes[child].nextSibling;
+      if (p.drawn[child].inTree == p.userspace)
+         p.drawn[step.node].printedChildren++;
+      else if (!enter(child))
+         return false;
    }
-   d.path[depth] = index;
-   for (int32_t c = n.firstChild; c >= 0; c = nodes[c].nextSibling) {
-      if (nodes[c].drawnInTree == d.userspace)
-         n.printedChildren++;
-      else
-         PrintPsTree(d, c, depth + 1);
-   }
+   return true;
 }
 
 // Tells which userspaces are running when the requested one is not.
-void ReportNotRunning(const Gathering &g) {
-   std::fprintf(stderr, "Requested userspace (%d) is not running.\n", int32_t(g.requestedUserspace));
+void ReportNotRunning(const Printer &p) {
+   std::fprintf(stderr, "Requested userspace (%d) is not running.\n", int32_t(p.requestedUserspace));
    std::fputs("Available userspaces:\n ", stderr);
    for (uint32_t k = 1; k <= kMaxUserspace; k++) {
-      if (g.roots[k] < 0) continue;
+      if (p.t.roots[k] < 0) continue;
       std::fprintf(stderr, "%3d ", int(k));
       if (k > 1 && (k - 1) % 10 == 0) std::fputs("\n", stderr);
    }
@@ -643,49 +721,49 @@ void ReportNotRunning(const Gathering &g) {
 }
 
 // Prints the table or the trees and the summary; false when the requested
-// userspace is not running or a tree was too deep to draw whole.
-bool PrintWorlds(Gathering &g) {
-   uint32_t o = g.options;
-   uint32_t wanted = g.requestedUserspace;
-   if ((o & kOptUserspace) && wanted != 0 && (wanted > kMaxUserspace || g.roots[wanted] < 0)) {
-      ReportNotRunning(g);
+// userspace is not running or memory runs out.
+bool PrintWorlds(const WorldTable &t, uint32_t requestedUserspace) {
+   uint32_t o = t.options;
+   Printer p{t, requestedUserspace};
+   uint32_t wanted = requestedUserspace;
+   if ((o & kOptUserspace) && wanted != 0 && (wanted > kMaxUserspace || t.roots[wanted] < 0)) {
+      ReportNotRunning(p);
       return false;
    }
-   g.idWidth = std::snprintf(nullptr, 0, "%d", int32_t(g.largestWorldId));
+   p.idWidth = std::snprintf(nullptr, 0, "%d", int32_t(t.largestWorldId));
 
    if (!(o & kOptTree)) {
-      PrintPsHeader(g);
-      for (uint32_t i = 0; i < g.allCount; i++) {
-         const WorldNode &n = g.allNodes[i];
+      PrintPsHeader(p);
+      for (uint32_t i = 0; i < t.allCount; i++) {
+         const WorldNode &n = t.allNodes[i];
          if ((o & kOptUserworlds) && CartelId(n) == 0) continue;
          if (wanted != 0 && UserspaceId(n) != wanted) continue;
-         PrintPsRow(g, n);
+         PrintPsRow(p, n);
       }
       std::fputs("\n", stdout);
    } else {
+      p.drawn = AllocArray<DrawnNode>(t.allCount);
+      if (!p.drawn) return OutOfMemory();
       std::printf("%c)0\n", 27);
-      TreeDrawing drawing{g, 0, {}};
       for (uint32_t k = 1; k <= kMaxUserspace; k++) {
-         if (g.roots[k] < 0 || (wanted != 0 && k != wanted)) continue;
-         PrintPsHeader(g);
-         drawing.userspace = k;
-         PrintPsTree(drawing, g.roots[k], 0);
+         if (t.roots[k] < 0 || (wanted != 0 && k != wanted)) continue;
+         PrintPsHeader(p);
+         p.userspace = k;
+         if (!PrintPsTree(p, t.roots[k])) {
+            std::fflush(stdout);
+            return OutOfMemory();
+         }
          std::fputs("\n", stdout);
       }
    }
 
    if (o & kOptSummary) {
-      int userspaces = int(std::count_if(std::begin(g.roots) + 1, std::end(g.roots), [](int32_t r) { return r >= 0; }));
-      std::printf("Total worlds:         %d\n", g.totalWorlds);
-      std::printf("Total printed worlds: %d\n", g.keptWorlds);
-      if (o & kOptTree) std::printf("Deepest child:        %d\n", g.deepest + 1);
-      if (o & kOptZombies) std::printf("Zombie worlds:        %d\n", g.zombiesFound);
+      int userspaces = int(std::count_if(std::begin(t.roots) + 1, std::end(t.roots), [](int32_t r) { return r >= 0; }));
+      std::printf("Total worlds:         %d\n", t.totalWorlds);
+      std::printf("Total printed worlds: %d\n", t.keptWorlds);
+      if (o & kOptTree) std::printf("Deepest child:        %d\n", p.deepest + 1);
+      if (o & kOptZombies) std::printf("Zombie worlds:        %d\n", t.zombiesFound);
       std::printf("Total userspaces:     %d\n", userspaces);
-   }
-   if (g.treeCut) {
-      std::fflush(stdout);
-      std::fprintf(stderr, "ps: cartel trees deeper than %d levels are cut\n", kMaxTreeDepth);
-      return false;
    }
    return true;
 }
@@ -693,46 +771,46 @@ bool PrintWorlds(Gathering &g) {
 // Gathers the worlds, prints them and releases everything.  True when the
 // latest KEL status is 0 and the printing went through.
 bool WorldList(uint32_t options, uint32_t requestedUserspace) {
-   Gathering g;
-   g.options = options;
-   g.requestedUserspace = requestedUserspace;
-
-   ParamListPtr keys(KEL_ParamListCreate(1, 1));
-   if (!keys) return OutOfMemory();
-   ParamListPtr worlds;
-   KEL_Node listNode = (options & kOptCartels) ? KEL_NODE_userworld_cartel : KEL_NODE_world;
-   g.latest = GetInstanceList(listNode, nullptr, &worlds);
-   if (g.latest != KEL_STATUS_OK) {
-      std::fprintf(stderr, "WorldList: error fetching world list 0x%x\n", g.latest);
-      return false;
-   }
-
-   uint32_t count = KEL_ParamListUsedCount(worlds.get());
-   if (count > 0) {
-      g.gathered.reset(static_cast<WorldNode *>(std::calloc(count, sizeof(WorldNode))));
-      if (!g.gathered) {
-         std::fputs("WorldList: malloc failed when allocating root tree node\n", stderr);
-         return false;
-      }
-   }
-   for (uint32_t i = 0; i < count; i++) {
-      WorldNode n = NewNode();
-      n.nThreads = 1;
-      if (!AddParamToList(KEL_ParamListGetParam(worlds.get(), i), keys.get())) return false;
-      g.totalWorlds++;
-      Gathered result = ReadWorld(g, keys.get(), n);
-      if (result == Gathered::Failed) return false;
-      if (result == Gathered::Kept) g.gathered[g.keptWorlds++] = n;
-      KEL_ParamListRemoveLastParam(keys.get());
-   }
-
-   if (!BuildAllNodes(g)) return false;
-   if ((options & kOptTree) && !LinkTree(g)) return false;
-   bool printed = PrintWorlds(g);
-   return printed && g.latest == KEL_STATUS_OK;
+   WorldTable t;
+   t.options = options;
+   if (!GatherWorlds(t) || !BuildAllNodes(t)) return false;
+   if ((options & kOptTree) && !LinkTree(t)) return false;
+   bool printed = PrintWorlds(t, requestedUserspace);
+   return printed && t.latest == KEL_STATUS_OK;
 }
 
 }  // namespace
+
+namespace psparents {
+
+// Candidate parents sorted by world ID and then position, so that a binary
+// search finds the first node of a world ID in the nodes' own order.
+bool FindParents(const NodeIds *nodes, uint32_t count, int32_t *parents) {
+   struct Candidate {
+      uint32_t worldId;
+      int32_t node;
+   };
+   MallocPtr<Candidate> candidates = AllocArray<Candidate>(count);
+   if (!candidates) return false;
+   uint32_t used = 0;
+   for (uint32_t i = 0; i < count; i++)
+      if (nodes[i].cartelId != 0) candidates[used++] = {nodes[i].worldId, int32_t(i)};
+   auto byWorldThenNode = [](const Candidate &a, const Candidate &b) {
+      return a.worldId != b.worldId ? a.worldId < b.worldId : a.node < b.node;
+   };
+   Candidate *begin = candidates.get(), *end = begin + used;
+   std::sort(begin, end, byWorldThenNode);
+   for (uint32_t i = 0; i < count; i++) {
+      parents[i] = -1;
+      if (nodes[i].cartelId == 0) continue;
+      uint32_t wanted = nodes[i].parentCartelId;
+      const Candidate *c = std::lower_bound(begin, end, Candidate{wanted, -1}, byWorldThenNode);
+      if (c != end && c->worldId == wanted) parents[i] = c->node;
+   }
+   return true;
+}
+
+}  // namespace psparents
 
 int PsMain(int argc, char **argv) {
    uint32_t options = 0;
