@@ -248,6 +248,28 @@ Available userspaces:
  12  21 
  22  31 
 127 
+=== case -U127 is the last userspace that can be asked for
+snapshot: many-userspaces
+run: ps -U127
+exit: 0
+--- stdout
+WID  CID  WorldName  UserSpace
+127  0    u127  127      
+
+--- stderr
+Warning: maximum number of userspaces reached...
+=== case -U128 is past the table: not running, like any other absent one
+snapshot: many-userspaces
+run: ps -U128
+exit: 1
+--- stderr
+Warning: maximum number of userspaces reached...
+Requested userspace (128) is not running.
+Available userspaces:
+   1   2   3   4   5   6   7   8   9  10  11 
+ 12  21 
+ 22  31 
+127 
 === case a cycle back to the root through a world whose ID is 0 is drawn once
 snapshot: cycle
 run: ps -J -P -i
