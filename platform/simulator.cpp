@@ -11,7 +11,9 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <functional>
 #include <string>
+#include <string_view>
 #include <unordered_map>
 #include <vector>
 
@@ -62,6 +64,16 @@ bool ValidDateTime(int month, int day, int year, int hours, int minutes, int sec
 // that charge its files to disks.  Files under that directory report device 1;
 // their inode statistics are made from the real file and the first matching
 // rule.
+//
+// Nothing is walked ahead of the tool: each path it names through
+// OrxFs_Lstat is placed under the root when it is asked about, with no
+// system call beyond its own lstat in the common case.  A directory found
+// under the root is remembered by the path the tool named it with, so that
+// its entries, named as that path, a slash and their own name, are placed
+// from it.  Any other path is placed by going up from it through ".." by
+// descriptor until the root or a remembered directory is met, never
+// through a joined path: a file deep below a root with a long absolute path
+// is placed like any other.
 
 enum class RuleKind { Tardisk, Ramdisk, Foreign };
 
@@ -72,18 +84,48 @@ struct Rule {
    uint32_t flags;
 };
 
+// A directory under the root: its path relative to the root, the rules that
+// can match it or something below it (in rule order, so the first match
+// among them is the first match of all), and whether its entries belong to
+// the root's tree.  They do not below a foreign rule: what lies there stands
+// for another file system.
+struct KnownDir {
+   std::string rel;
+   std::vector<uint32_t> rules;
+   bool entriesInside;
+};
+
+// What an inode statistics read answers from.
 struct SimInode {
    int rule;  // index into rules, or -1 when none matches
    uint64_t size;
    std::string name;
 };
 
+// Finds directories by a path given as a string_view without copying it.
+struct PathHash {
+   using is_transparent = void;
+   size_t operator()(std::string_view s) const { return std::hash<std::string_view>{}(s); }
+};
+
 struct Corafs {
    bool built = false;
    bool haveRoot = false;
    dev_t rootDev = 0;
+   std::string rootName;  // the root as the snapshot names it
    std::vector<Rule> rules;
+   KnownDir root;
+   // Directories under the root by the path the tool named them with (no
+   // trailing slash), and by inode, where the way up from a path ends.
+   std::unordered_map<std::string, KnownDir, PathHash, std::equal_to<>> dirsByPath;
+   std::unordered_map<ino_t, const KnownDir *> dirsByInode;
+   // The directory of the last entry placed: a walk asks about the entries of
+   // one directory one after another.
+   std::string_view lastPath;
+   const KnownDir *lastDir = nullptr;
+   // Inodes the tool has been told are on the root's device.
    std::unordered_map<ino_t, SimInode> inodes;
+   std::string rel;  // scratch: the path of the entry being placed
 };
 
 std::vector<Rule> ParseRules(std::string_view text) {
@@ -110,99 +152,59 @@ std::vector<Rule> ParseRules(std::string_view text) {
    return rules;
 }
 
-int MatchRule(const std::vector<Rule> &rules, const std::string &rel) {
-   for (size_t i = 0; i < rules.size(); i++) {
-      const std::string &p = rules[i].prefix;
-      if (p.empty() || rel == p || (rel.size() > p.size() && rel.compare(0, p.size(), p) == 0 &&
-                                    rel[p.size()] == '/'))
-         return int(i);
-   }
+// A rule's prefix matches rel itself or a folder above it.
+bool Matches(std::string_view prefix, std::string_view rel) {
+   return prefix.empty() || rel == prefix ||
+          (rel.size() > prefix.size() && rel.starts_with(prefix) && rel[prefix.size()] == '/');
+}
+
+// A rule's prefix lies strictly below the folder rel.
+bool Below(std::string_view prefix, std::string_view rel) {
+   if (rel.empty()) return !prefix.empty();
+   return prefix.size() > rel.size() + 1 && prefix.starts_with(rel) && prefix[rel.size()] == '/';
+}
+
+int FirstMatch(const Corafs &fs, const std::vector<uint32_t> &candidates, std::string_view rel) {
+   for (uint32_t i : candidates)
+      if (Matches(fs.rules[i].prefix, rel)) return int(i);
    return -1;
 }
 
-// One directory of the index walk: where its path relative to the root
-// ends, the subdirectories still to enter, and its identity, so that the
-// way back up through ".." is checked.
-struct Level {
-   size_t relLength;
-   std::vector<std::string> subdirs;
-   size_t next;
-   dev_t dev;
-   ino_t ino;
-};
+bool IsForeign(const Corafs &fs, int rule) { return rule >= 0 && fs.rules[size_t(rule)].kind == RuleKind::Foreign; }
 
-// Records the entries of the directory open at dir, whose path relative to
-// the root is rel, and notes the subdirectories to enter.  A foreign rule
-// stops the walk there: what lies below stands for another file system.
-void IndexEntries(Corafs &fs, int dir, const std::string &rel, Level *level) {
-   // readdir needs a descriptor of its own; dir stays open for fstatat.
-   int own = openat(dir, ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-   if (own < 0) return;
-   DIR *d = fdopendir(own);
-   if (d == nullptr) {
-      close(own);
-      return;
-   }
-   while (struct dirent *e = readdir(d)) {
-      if (std::strcmp(e->d_name, ".") == 0 || std::strcmp(e->d_name, "..") == 0) continue;
-      struct stat st;
-      if (fstatat(dir, e->d_name, &st, AT_SYMLINK_NOFOLLOW) != 0 || st.st_dev != fs.rootDev) continue;
-      std::string childRel = rel.empty() ? std::string(e->d_name) : rel + "/" + e->d_name;
-      int rule = MatchRule(fs.rules, childRel);
-      fs.inodes.emplace(st.st_ino, SimInode{rule, uint64_t(st.st_size), e->d_name});
-      bool foreign = rule >= 0 && fs.rules[size_t(rule)].kind == RuleKind::Foreign;
-      if (S_ISDIR(st.st_mode) && !foreign) level->subdirs.emplace_back(e->d_name);
-   }
-   closedir(d);
+bool IsDotName(std::string_view name) { return name == "." || name == ".."; }
+
+// The path as a directory key: without trailing slashes, "/" kept.
+std::string_view DirKey(std::string_view path) {
+   while (path.size() > 1 && path.back() == '/') path.remove_suffix(1);
+   return path;
 }
 
-// Walks the root once, recording every inode on its device.  The walk goes
-// from directory to directory by descriptor (openat, fstatat, and ".." on
-// the way back), never through a joined path, so that no depth of the tree
-// is out of reach of the system's path limit; one directory is open at a
-// time.  Should the tree change under the walk so that ".." no longer leads
-// back, the walk ends with what it has recorded.
-void Index(Corafs &fs, const std::string &root) {
-   int dir = open(root.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-   struct stat st;
-   if (dir < 0) return;
-   if (fstat(dir, &st) != 0) {
-      close(dir);
-      return;
+// Opens the root and notes its identity.  A relative root is taken relative
+// to the folder of the snapshot file, opened by descriptor so that no joined
+// path is needed.
+void OpenRoot(Corafs &fs, const std::string &root) {
+   int base = AT_FDCWD;
+   if (root[0] != '/') {
+      std::string_view snapshot = SimulatorPath();
+      size_t slash = snapshot.rfind('/');
+      std::string folder = slash == std::string_view::npos ? "." : std::string(snapshot.substr(0, slash + 1));
+      base = open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+      if (base < 0) return;
    }
-   fs.haveRoot = true;
-   fs.rootDev = st.st_dev;
-   fs.inodes[st.st_ino] = {MatchRule(fs.rules, ""), uint64_t(st.st_size), root};
-   std::string rel;  // the current directory's path relative to the root
-   std::vector<Level> levels;
-   levels.push_back({0, {}, 0, st.st_dev, st.st_ino});
-   IndexEntries(fs, dir, rel, &levels.back());
-   while (!levels.empty()) {
-      Level &top = levels.back();
-      if (top.next < top.subdirs.size()) {
-         const std::string &name = top.subdirs[top.next++];
-         int child = openat(dir, name.c_str(), O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC);
-         if (child < 0) continue;
-         if (fstat(child, &st) != 0 || st.st_dev != fs.rootDev) {
-            close(child);
-            continue;
-         }
-         rel.resize(top.relLength);
-         if (!rel.empty()) rel += '/';
-         rel += name;
-         close(dir);
-         dir = child;
-         levels.push_back({rel.size(), {}, 0, st.st_dev, st.st_ino});
-         IndexEntries(fs, dir, rel, &levels.back());
-         continue;
-      }
-      levels.pop_back();
-      if (levels.empty()) break;
-      int parent = openat(dir, "..", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-      close(dir);
-      dir = parent;
-      if (dir < 0) return;
-      if (fstat(dir, &st) != 0 || st.st_dev != levels.back().dev || st.st_ino != levels.back().ino) break;
+   int dir = openat(base, root.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+   if (base != AT_FDCWD) close(base);
+   if (dir < 0) return;
+   struct stat st;
+   if (fstat(dir, &st) == 0) {
+      fs.haveRoot = true;
+      fs.rootDev = st.st_dev;
+      fs.rootName = root;
+      fs.root.rel.clear();
+      for (uint32_t i = 0; i < fs.rules.size(); i++) fs.root.rules.push_back(i);
+      // The root's own rule does not keep its entries out.
+      fs.root.entriesInside = true;
+      fs.dirsByInode[st.st_ino] = &fs.root;
    }
    close(dir);
 }
@@ -213,9 +215,150 @@ Corafs &TheCorafs() {
       fs.built = true;
       std::optional<std::string_view> root = TreeMeta("corafs.root");
       if (std::optional<std::string_view> rules = TreeMeta("corafs.rules")) fs.rules = ParseRules(*rules);
-      if (root && !root->empty()) Index(fs, std::string(*root));
+      if (root && !root->empty()) OpenRoot(fs, std::string(*root));
    }
    return fs;
+}
+
+// The remembered directory that path names as the part before its last
+// slash, with the entry's own name; nullptr when there is none.
+const KnownDir *ParentByPath(Corafs &fs, std::string_view path, std::string_view *name) {
+   size_t slash = path.rfind('/');
+   if (slash == std::string_view::npos) return nullptr;
+   *name = path.substr(slash + 1);
+   if (name->empty() || IsDotName(*name)) return nullptr;
+   std::string_view dir = DirKey(path.substr(0, slash + 1));
+   if (fs.lastDir != nullptr && dir == fs.lastPath) return fs.lastDir;
+   auto it = fs.dirsByPath.find(dir);
+   if (it == fs.dirsByPath.end()) return nullptr;
+   fs.lastPath = it->first;
+   fs.lastDir = &it->second;
+   return fs.lastDir;
+}
+
+// The name under which the directory open at parent holds the inode, found
+// as getcwd finds it: by the entries' inode numbers, and failing that (at a
+// mount point they differ) by asking each entry.
+bool NameIn(int parent, dev_t dev, ino_t ino, std::string *name) {
+   int own = openat(parent, ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+   if (own < 0) return false;
+   DIR *d = fdopendir(own);
+   if (d == nullptr) {
+      close(own);
+      return false;
+   }
+   bool found = false;
+   for (int pass = 0; pass < 2 && !found; pass++) {
+      if (pass == 1) rewinddir(d);
+      while (const dirent *e = readdir(d)) {
+         if (IsDotName(e->d_name) || (pass == 0 && e->d_ino != ino)) continue;
+         struct stat st;
+         if (fstatat(parent, e->d_name, &st, AT_SYMLINK_NOFOLLOW) == 0 && st.st_dev == dev && st.st_ino == ino) {
+            *name = e->d_name;
+            found = true;
+            break;
+         }
+      }
+   }
+   closedir(d);
+   return found;
+}
+
+// Places the inode that path names (st, from lstat) by going up from it
+// through ".." until a remembered directory (the root at the latest) is
+// met: *base is that directory and *rel the path relative to the root.  One
+// or two folders are open at a time.  False when the way up leaves the
+// root's device or reaches the top of the file system first.
+bool PlaceByDescriptor(Corafs &fs, const char *path, const struct stat &st, std::string *rel,
+                       const KnownDir **base) {
+   std::vector<std::string> names;  // from the inode upwards
+   int dir;
+   if (S_ISDIR(st.st_mode)) {
+      dir = open(path, O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC);
+   } else {
+      // A non-directory is its folder's entry: the path's last name.
+      std::string_view p(path);
+      size_t slash = p.rfind('/');
+      std::string folder = slash == std::string_view::npos ? "." : std::string(p.substr(0, slash + 1));
+      names.emplace_back(p.substr(slash == std::string_view::npos ? 0 : slash + 1));
+      dir = open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+   }
+   if (dir < 0) return false;
+   struct stat cur;
+   bool placed = false;
+   // A directory replaced since its lstat is not placed.
+   if (fstat(dir, &cur) == 0 && (!S_ISDIR(st.st_mode) || (cur.st_dev == st.st_dev && cur.st_ino == st.st_ino))) {
+      while (cur.st_dev == fs.rootDev) {
+         auto known = fs.dirsByInode.find(cur.st_ino);
+         if (known != fs.dirsByInode.end()) {
+            *base = known->second;
+            placed = true;
+            break;
+         }
+         int parent = openat(dir, "..", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+         if (parent < 0) break;
+         struct stat up;
+         std::string name;
+         bool top = fstat(parent, &up) != 0 || (up.st_dev == cur.st_dev && up.st_ino == cur.st_ino);
+         bool named = !top && NameIn(parent, cur.st_dev, cur.st_ino, &name);
+         close(dir);
+         dir = parent;
+         if (!named) break;
+         names.push_back(std::move(name));
+         cur = up;
+      }
+   }
+   close(dir);
+   if (!placed) return false;
+   *rel = (*base)->rel;
+   for (size_t i = names.size(); i-- > 0;) {
+      if (!rel->empty()) *rel += '/';
+      *rel += names[i];
+   }
+   return true;
+}
+
+// Places a path the tool asks about: true, with the index of its rule (-1
+// for none), when it is in the root's tree.  Remembers what a later read of
+// its inode statistics, and the placing of its entries, need.
+bool Place(Corafs &fs, const char *path, const struct stat &st, int *rule) {
+   std::string &rel = fs.rel;
+   std::string_view name;
+   const std::vector<uint32_t> *candidates;
+   if (const KnownDir *parent = ParentByPath(fs, path, &name)) {
+      if (!parent->entriesInside) return false;
+      rel = parent->rel;
+      if (!rel.empty()) rel += '/';
+      rel += name;
+      candidates = &parent->rules;
+   } else {
+      const KnownDir *base = nullptr;
+      if (!PlaceByDescriptor(fs, path, st, &rel, &base)) return false;
+      // Below the remembered directory, no folder above the entry may be foreign.
+      if (rel.size() > base->rel.size() && !base->entriesInside) return false;
+      for (size_t at = base->rel.size() + 1; at < rel.size(); at++)
+         if (rel[at] == '/' && IsForeign(fs, FirstMatch(fs, fs.root.rules, std::string_view(rel).substr(0, at))))
+            return false;
+      candidates = &base->rules;
+   }
+   *rule = FirstMatch(fs, *candidates, rel);
+
+   size_t slash = rel.rfind('/');
+   std::string_view own = rel.empty() ? std::string_view(fs.rootName)
+                                      : std::string_view(rel).substr(slash == std::string::npos ? 0 : slash + 1);
+   fs.inodes.insert_or_assign(st.st_ino, SimInode{*rule, uint64_t(st.st_size), std::string(own)});
+
+   if (S_ISDIR(st.st_mode)) {
+      std::string_view key = DirKey(path);
+      if (fs.dirsByPath.find(key) == fs.dirsByPath.end()) {
+         KnownDir dir{rel, {}, rel.empty() || !IsForeign(fs, *rule)};
+         for (uint32_t i : *candidates)
+            if (Matches(fs.rules[i].prefix, rel) || Below(fs.rules[i].prefix, rel)) dir.rules.push_back(i);
+         auto added = fs.dirsByPath.emplace(std::string(key), std::move(dir)).first;
+         fs.dirsByInode.emplace(st.st_ino, &added->second);
+      }
+   }
+   return true;
 }
 
 void PutText(uint8_t *record, size_t offset, size_t width, std::string_view text) {
@@ -282,13 +425,12 @@ int SimulatorLstat(const char *path, struct stat *st) {
    int r = lstat(path, st);
    if (r != 0) return r;
    Corafs &fs = TheCorafs();
-   auto it = fs.haveRoot && st->st_dev == fs.rootDev ? fs.inodes.find(st->st_ino) : fs.inodes.end();
-   if (it == fs.inodes.end()) {
+   int rule;
+   if (!fs.haveRoot || st->st_dev != fs.rootDev || !Place(fs, path, *st, &rule)) {
       if (st->st_dev == 1) st->st_dev = 0;  // only the root's tree is device 1
       return 0;
    }
-   int rule = it->second.rule;
-   st->st_dev = rule >= 0 && fs.rules[size_t(rule)].kind == RuleKind::Foreign ? 2 : 1;
+   st->st_dev = IsForeign(fs, rule) ? 2 : 1;
    return 0;
 }
 

@@ -53,6 +53,13 @@ The tree of most cases ("main"):
 === snapshot long-root extends disks
 {"simulator": {"corafsRoot": "@ROOT", "corafsRules": [
    {"path": "", "kind": "ramdisk", "disk": "root", "flags": 64}]}}
+=== snapshot relative-root extends disks
+{"simulator": {"corafsRoot": "root"}}
+=== snapshot rule-below-foreign extends disks
+{"simulator": {"corafsRules": [
+   {"path": "mnt/data/big", "kind": "ramdisk", "disk": "tmpfs", "flags": 0},
+   {"path": "mnt", "kind": "foreign", "disk": "", "flags": 0},
+   {"path": "", "kind": "ramdisk", "disk": "root", "flags": 64}]}}
 === snapshot unlinked
 {"buildDate": "Nov 30 2026",
  "tree": {"system": {"corafs": {
@@ -365,6 +372,54 @@ For '.':
                           ramdisk root:            0		(   23 inodes)
 --- stderr
 path too long for '@DEEP' '@LONG' (4222)
+=== case a start path through a symbolic link and ".." is placed by where it leads
+snapshot: disks
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data elsewhere && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big && ln -s ../root/docs elsewhere/link
+cwd: @TMP/elsewhere
+run: vdu -a link/guide/..
+exit: 0
+--- stdout
+For 'link/guide/../guide/readme':
+                          ramdisk logs:         5000
+For 'link/guide/../guide':
+                     tardisk tools.t00:            0		(    1 inodes)
+                          ramdisk logs:         5000		(    1 inodes)
+For 'link/guide/..':
+                          ramdisk root:            0		(    1 inodes)
+                     tardisk tools.t00:            0		(    1 inodes)
+                          ramdisk logs:         5000		(    1 inodes)
+=== case what lies below a foreign folder is another file system, whatever rule names it
+snapshot: rule-below-foreign
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -a mnt/data/big
+exit: 0
+=== case a relative root is taken relative to the snapshot file's folder, not the working folder
+snapshot: relative-root
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+cwd: @TMP/root
+run: vdu -s
+exit: 0
+--- stdout
+For '.':
+                          ramdisk root:            0		(    2 inodes)
+                     tardisk tools.t00:            0		(    1 inodes)
+                          ramdisk logs:         5000		(    1 inodes)
+=== case a relative root below a snapshot named by a relative path
+snapshot: relative-root
+mode: sim
+setup: mkdir -p root/docs/guide root/mnt/data && truncate -s 5000 root/docs/guide/readme && : > root/docs/empty && truncate -s 7000 root/mnt/data/big
+env: ORXKEL_SIMULATOR=../../snapshot.cache
+cwd: @TMP/root/docs
+run: vdu -d 0 guide
+exit: 0
+--- stdout
+For 'guide':
+                     tardisk tools.t00:            0		(    1 inodes)
+                          ramdisk logs:         5000		(    1 inodes)
 === case -u: unlinked files, their count and total size
 snapshot: unlinked
 mode: sim
