@@ -188,25 +188,59 @@ void CacheReader::Close() {
    count_ = 0;
 }
 
+// The checks of the fixed header against the size of the bytes it heads
+// (at least kHeaderSize): format, version, the size the header claims and
+// where the index lies.
+static KEL_Status CheckHeader(const uint8_t *p, uint64_t size) {
+   if (std::memcmp(p, kCacheMagic, 7) != 0) return KEL_STATUS_CACHE_FORMAT;
+   if (p[7] != uint8_t(kCacheMagic[7]) || LoadU32(p + 8) != kCacheVersion) return KEL_STATUS_CACHE_VERSION;
+   uint64_t total = LoadU64(p + 64);
+   // Offsets are 32 bits: a larger file is damage, refused before any byte
+   // past the header is read (its checksum alone would take minutes).
+   if (total > kMaxCacheFileSize) return KEL_STATUS_CACHE_CORRUPT;
+   if (total > size) return KEL_STATUS_CACHE_TRUNCATED;
+   if (total != size) return KEL_STATUS_CACHE_CORRUPT;
+   uint32_t count = LoadU32(p + 56);
+   uint32_t index = LoadU32(p + 60);
+   if (index < kHeaderSize || index > total || (total - index) / kIndexEntrySize < count)
+      return KEL_STATUS_CACHE_CORRUPT;
+   return KEL_STATUS_OK;
+}
+
 KEL_Status CacheReader::Open(const char *path, int flags) {
    Close();
-   int fd = open(path, O_RDONLY | O_CLOEXEC);
+   // Opening never waits (a FIFO without a writer would block a plain
+   // open); what is not a regular file is refused right after.
+   int fd = open(path, O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY);
    if (fd < 0) return KEL_STATUS_CACHE_OPEN;
    struct stat st;
    if (fstat(fd, &st) != 0 || !S_ISREG(st.st_mode)) {
       close(fd);
       return KEL_STATUS_CACHE_OPEN;
    }
-   if (size_t(st.st_size) < kHeaderSize) {
+   uint64_t fileSize = uint64_t(st.st_size);
+   if (fileSize < kHeaderSize) {
       close(fd);
-      return st.st_size == 0 ? KEL_STATUS_CACHE_FORMAT : KEL_STATUS_CACHE_TRUNCATED;
+      return fileSize == 0 ? KEL_STATUS_CACHE_FORMAT : KEL_STATUS_CACHE_TRUNCATED;
    }
-   void *map = mmap(nullptr, size_t(st.st_size), PROT_READ, MAP_PRIVATE, fd, 0);
+   // The header decides first, so that a file larger than the format allows
+   // (or than a 32-bit size_t holds) is never mapped.
+   uint8_t header[kHeaderSize];
+   if (pread(fd, header, kHeaderSize, 0) != ssize_t(kHeaderSize)) {
+      close(fd);
+      return KEL_STATUS_CACHE_OPEN;
+   }
+   KEL_Status status = CheckHeader(header, fileSize);
+   if (status != KEL_STATUS_OK) {
+      close(fd);
+      return status;
+   }
+   void *map = mmap(nullptr, size_t(fileSize), PROT_READ, MAP_PRIVATE, fd, 0);
    close(fd);
    if (map == MAP_FAILED) return KEL_STATUS_CACHE_OPEN;
    map_ = map;
-   mapSize_ = size_t(st.st_size);
-   KEL_Status status = Attach({static_cast<const char *>(map), mapSize_}, flags);
+   mapSize_ = size_t(fileSize);
+   status = Attach({static_cast<const char *>(map), mapSize_}, flags);
    if (status != KEL_STATUS_OK) Close();
    return status;
 }
@@ -214,22 +248,14 @@ KEL_Status CacheReader::Open(const char *path, int flags) {
 KEL_Status CacheReader::Attach(std::string_view bytes, int flags) {
    const auto *p = reinterpret_cast<const uint8_t *>(bytes.data());
    if (bytes.size() < kHeaderSize) return KEL_STATUS_CACHE_TRUNCATED;
-   if (std::memcmp(p, kCacheMagic, 7) != 0) return KEL_STATUS_CACHE_FORMAT;
-   if (p[7] != uint8_t(kCacheMagic[7]) || LoadU32(p + 8) != kCacheVersion)
-      return KEL_STATUS_CACHE_VERSION;
-   uint64_t total = LoadU64(p + 64);
-   if (total > bytes.size()) return KEL_STATUS_CACHE_TRUNCATED;
-   if (total != bytes.size()) return KEL_STATUS_CACHE_CORRUPT;
-   uint32_t count = LoadU32(p + 56);
-   uint32_t index = LoadU32(p + 60);
-   if (index < kHeaderSize || index > total || (total - index) / kIndexEntrySize < count)
-      return KEL_STATUS_CACHE_CORRUPT;
+   KEL_Status status = CheckHeader(p, bytes.size());
+   if (status != KEL_STATUS_OK) return status;
    if (!(flags & KEL_CACHE_NO_CHECKSUM) &&
        Checksum(p + kHeaderSize, bytes.size() - kHeaderSize) != LoadU64(p + 72))
       return KEL_STATUS_CACHE_CORRUPT;
    bytes_ = bytes;
-   count_ = count;
-   indexOffset_ = index;
+   count_ = LoadU32(p + 56);
+   indexOffset_ = LoadU32(p + 60);
    return KEL_STATUS_OK;
 }
 

@@ -9,7 +9,7 @@
 //  32  24  kernel build date, NUL-padded (at most 20 characters)
 //  56   4  entry count N
 //  60   4  index offset
-//  64   8  total file size
+//  64   8  total file size (at most 4 GiB - 1: offsets are 32 bits)
 //  72   8  checksum of bytes 80 .. total size
 //  80      index: N entries of 20 bytes, sorted by their key bytes
 //          (memcmp order, a shorter key first on a common prefix):
@@ -52,6 +52,8 @@ constexpr uint32_t kCacheVersion = 1;
 constexpr size_t kHeaderSize = 80;
 constexpr size_t kIndexEntrySize = 20;
 constexpr size_t kBuildDateMax = 20;
+// Every byte of a file lies at an offset that 32 bits can name.
+constexpr uint64_t kMaxCacheFileSize = 0xffffffff;
 
 inline uint32_t LoadU32(const uint8_t *p) {
    return uint32_t(p[0]) | uint32_t(p[1]) << 8 | uint32_t(p[2]) << 16 | uint32_t(p[3]) << 24;

@@ -2,7 +2,10 @@
 #ifndef PLATFORM_INTERNAL_H
 #define PLATFORM_INTERNAL_H
 
+#include <cstddef>
 #include <cstdint>
+#include <optional>
+#include <string_view>
 #include <vector>
 
 #include "kel/kel.h"
@@ -30,6 +33,16 @@ namespace kelplat {
 // Appends an entry of any kind (used for keys read back from a cache file).
 KEL_Status ParamListAppend(KEL_ParamList *list, uint32_t kind, uint64_t value, const char *text,
                            size_t textLength);
-}
+
+// The loaded tree (kel.cpp), for the simulator's answers (simulator.cpp).
+// Fills exactly size bytes: a shorter record is zero-filled, a longer one cut.
+void CopyRecord(std::string_view stored, void *buf, uint32_t size);
+// A setting stored with the tree ("corafs.root"), or nothing.
+std::optional<std::string_view> TreeMeta(std::string_view name);
+// The snapshot ORXKEL_SIMULATOR names, or null when it names none.
+const char *SimulatorPath();
+// Whether the calls run against the simulator.
+bool InSimulator();
+}  // namespace kelplat
 
 #endif

@@ -12,12 +12,6 @@ struct stat;
 
 namespace kelplat {
 
-// Shared with kel.cpp.
-// Fills exactly size bytes: a shorter record is zero-filled, a longer one cut.
-void CopyRecord(std::string_view stored, void *buf, uint32_t size);
-std::optional<std::string_view> TreeMeta(std::string_view name);
-const char *SimulatorPath();
-
 // The real-time clock once it has been set; false leaves the read to the snapshot.
 bool SimulatorClock(const NodeInfo &node, void *buf, uint32_t size, KEL_Status *status);
 // A read the snapshot has no entry for: inode statistics made from the real

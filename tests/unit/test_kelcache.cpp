@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <fstream>
 #include <optional>
 #include <sstream>
@@ -368,4 +369,78 @@ TEST(Kelcache, HandMadeFilesRoundTripThroughRawEntries) {
    EXPECT_NE(json.find(R"("$noListing": true)"), std::string::npos) << json;
    EXPECT_NE(json.find(R"("rawEntries")"), std::string::npos) << json;
    EXPECT_EQ(MustBuild(json), bytes) << json;
+}
+
+// At every node whose last level is an instance, an instance given as {}
+// (or with "$unlisted" alone) is listed but has nothing to read; one with a
+// field, even a zero, is stored.
+TEST(Kelcache, EmptyInstancesAreListedButHaveNothingToRead) {
+   const std::string json = R"({"tree": {
+      "userworld": {"cartel": {"9": {"child": {"5": {}, "6": {"state": 0}, "7": {"$unlisted": true}},
+                                     "fd": {"fds": {"3": {}}},
+                                     "mem": {"mmaps": {"4096": {}}}}}},
+      "hardware": {"interrupts": {"cookieList": {"48": {"PCPU": {"0": {}, "1": {"count": 0}}}}},
+                   "acpi": {"tables": {"0": {"buffers": {"2": {}}}}}}}})";
+   Built b(json);
+   const struct {
+      KEL_Node node;
+      std::vector<Key> keys;  // the listing's keys; the instance is the last
+      Key instance;
+      bool stored;
+   } kCases[] = {
+      {KEL_NODE_userworld_cartel_child, {Int(9)}, Int(5), false},
+      {KEL_NODE_userworld_cartel_child, {Int(9)}, Int(6), true},
+      {KEL_NODE_userworld_cartel_fd_fds, {Int(9)}, Int(3), false},
+      {KEL_NODE_userworld_cartel_mem_mmaps, {Int(9)}, Int(4096), false},
+      {KEL_NODE_hardware_interrupts_cookieList_PCPU, {Int(48)}, Int(0), false},
+      {KEL_NODE_hardware_interrupts_cookieList_PCPU, {Int(48)}, Int(1), true},
+      {KEL_NODE_hardware_acpi_tables_buffers, {Int(0)}, Int(2), false},
+   };
+   for (const auto &c : kCases) {
+      std::vector<Key> listed = b.Listing(c.node, c.keys);
+      EXPECT_NE(std::find(listed.begin(), listed.end(), c.instance), listed.end()) << c.node;
+      std::vector<Key> full = c.keys;
+      full.push_back(c.instance);
+      EXPECT_EQ(b.Find(Op::Get, c.node, full).has_value(), c.stored) << c.node << " " << c.instance.value;
+   }
+   // Unlisted and empty: neither listed nor readable.
+   EXPECT_EQ(b.Listing(KEL_NODE_userworld_cartel_child, {Int(9)}), (std::vector<Key>{Int(5), Int(6)}));
+   EXPECT_FALSE(b.Find(Op::Get, KEL_NODE_userworld_cartel_child, {Int(9), Int(7)}));
+
+   // Through the platform the read answers Not found.
+   std::string path = ::testing::TempDir() + "kelcache-empty-" + std::to_string(getpid()) + ".cache";
+   std::ofstream(path, std::ios::binary) << b.bytes();
+   ASSERT_EQ(KEL_UseCache(path.c_str(), 0), KEL_STATUS_OK);
+   KEL_ParamList *keys = KEL_ParamListCreate(1, 1);
+   KEL_ParamListAddInt(keys, 9);
+   KEL_ParamListAddInt(keys, 3);
+   char fd[2084];
+   EXPECT_EQ(KEL_Get(KEL_NODE_userworld_cartel_fd_fds, keys, fd, sizeof fd), KEL_STATUS_NOT_FOUND);
+   KEL_ParamListDestroy(keys);
+   unlink(path.c_str());
+
+   // The dump writes such an instance as null, and builds back the same.
+   std::string dumped = MustDump(b.bytes());
+   EXPECT_NE(dumped.find(R"("3": null)"), std::string::npos) << dumped;
+   ExpectRoundTrip(json);
+}
+
+// An ACPI buffer's length defaults to the table bytes given ("data" or
+// "text"); without them the bytes of "$raw" stay as they are.
+TEST(Kelcache, AcpiLengthDefaultsOnlyToTableBytesGiven) {
+   const std::string json = R"({"tree": {"hardware": {"acpi": {"tables": {"0": {"buffers": {
+      "0": {"$raw": "53534454000700000041424344454647"},
+      "1": {"$raw": "53534454000700000041", "signature": "DSDT"},
+      "2": {"$raw": "53534454000700000041", "data": "5859"},
+      "3": {"$raw": "53534454000700000041", "text": "xyz", "length": 9}}}}}}}})";
+   Built b(json);
+   auto record = [&](uint64_t i) { return Record(b, KEL_NODE_hardware_acpi_tables_buffers, {Int(0), Int(i)}); };
+   EXPECT_EQ(U32At(record(0), 5), 7u);
+   EXPECT_EQ(record(0).substr(9, 7), "ABCDEFG");
+   EXPECT_EQ(U32At(record(1), 5), 7u);
+   EXPECT_EQ(record(1).substr(0, 4), "DSDT");
+   EXPECT_EQ(U32At(record(2), 5), 2u);
+   EXPECT_EQ(record(2).substr(9, 2), "XY");
+   EXPECT_EQ(U32At(record(3), 5), 9u);
+   ExpectRoundTrip(json);
 }

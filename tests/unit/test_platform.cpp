@@ -4,6 +4,7 @@
 #include <stdlib.h>
 #include <unistd.h>
 
+#include <chrono>
 #include <cstring>
 #include <fstream>
 #include <random>
@@ -331,5 +332,36 @@ TEST(Simulator, SetsTheClockAndRefusesImpossibleDates) {
 
    unsetenv("ORXKEL_SIMULATOR");
    unlink((path + ".rtc").c_str());
+   unlink(path.c_str());
+}
+
+// Offsets are 32 bits, so a header claiming a file of 4 GiB or more is
+// damage, refused from the header alone.
+TEST(CacheReader, SizesBeyondThirtyTwoBitOffsetsAreRefusedAtOnce) {
+   std::string bytes = SmallCache();
+   auto claim = [&](uint64_t total) {
+      std::string b = bytes;
+      StoreU64(reinterpret_cast<uint8_t *>(b.data()) + 64, total);
+      CacheReader r;
+      return r.Attach(b, 0);
+   };
+   EXPECT_EQ(claim(bytes.size() + 1), KEL_STATUS_CACHE_TRUNCATED);
+   EXPECT_EQ(claim(uint64_t(1) << 32), KEL_STATUS_CACHE_CORRUPT);
+   EXPECT_EQ(claim(~uint64_t(0)), KEL_STATUS_CACHE_CORRUPT);
+
+   // A sparse file of 4 GiB and 4 KiB whose header claims exactly its size:
+   // refused without reading it.
+   std::string path = TempPath("huge");
+   std::string header = bytes.substr(0, kHeaderSize);
+   const uint64_t huge = (uint64_t(1) << 32) + 4096;
+   StoreU64(reinterpret_cast<uint8_t *>(header.data()) + 64, huge);
+   WriteFile(path, header);
+   if (truncate(path.c_str(), off_t(huge)) != 0) {
+      unlink(path.c_str());
+      GTEST_SKIP() << "this file system cannot hold a sparse file of 4 GiB";
+   }
+   auto start = std::chrono::steady_clock::now();
+   EXPECT_EQ(KEL_UseCache(path.c_str(), 0), KEL_STATUS_CACHE_CORRUPT);
+   EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(1));
    unlink(path.c_str());
 }

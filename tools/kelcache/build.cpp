@@ -58,6 +58,11 @@ Json Parse(const std::string &text) {
 
 constexpr uint64_t kMaxCacheSize = 256u << 20;
 
+// {} (or an object of "$unlisted" alone) as the value of an instance.
+bool IsEmptyInstance(const Json &value) {
+   return value.is_object() && (value.empty() || (value.size() == 1 && value.contains("$unlisted")));
+}
+
 Key MetaKey(std::string_view name) { return Key{KEL_PARAM_STRING, 0, std::string(name)}; }
 
 class Builder {
@@ -124,6 +129,9 @@ void Builder::Walk(int pos, const Json &value, const std::string &path, bool ins
       return;
    }
    if (at.node != nullptr && at.node->recordSize > 0) {
+      // A listed instance given as {} has nothing to read: its read answers
+      // Not found, as one given as null.
+      if (instance && IsEmptyInstance(value)) return;
       RecordEntry r = EncodeRecord(*at.node, value, path, instance);
       Add(kelplat::EncodeLookup(Op::Get, at.node->number, keys_), r.status, std::move(r.data), path);
       if (r.setStatus) Add(kelplat::EncodeLookup(Op::Set, at.node->number, keys_), *r.setStatus, "", path);

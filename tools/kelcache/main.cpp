@@ -1,134 +1,257 @@
 // kelcache: turns a JSON snapshot of a KEL tree into a cache file, and a
-// cache file back into JSON.
+// cache file back into JSON.  Each subcommand is one row of kCommands: its
+// names, its usage line and its handler.
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
 #include <cerrno>
 #include <cstdio>
 #include <cstring>
-#include <fstream>
-#include <iostream>
-#include <sstream>
+#include <span>
 #include <string>
+#include <string_view>
 #include <vector>
 
+#include "cachefile.h"
 #include "kel/kel.h"
 #include "nodetable.h"
 #include "snapshot.h"
 
 namespace {
 
-constexpr char kUsage[] =
-   "usage: kelcache build SNAPSHOT.json -o FILE   make a cache file from a snapshot\n"
-   "       kelcache dump FILE                     write a cache file as a snapshot\n"
-   "       kelcache --tool-build-date             the build date the tools carry\n"
-   "       kelcache --tool-signature              the tree signature the tools expect\n"
-   "       kelcache --help\n"
-   "The snapshot format is described in docs/snapshot-format.md.\n";
+// The words after the subcommand's name.
+using Args = std::span<char *const>;
+
+struct Command {
+   std::string_view names;  // "--help|-h|help": the first is the one shown
+   std::string_view usage;  // what follows "kelcache " on the usage line
+   std::string_view about;  // empty: the usage line says enough
+   int (*run)(Args args);
+};
+
+int Build(Args args);
+int Dump(Args args);
+int ToolBuildDate(Args args);
+int ToolSignature(Args args);
+int Help(Args args);
+
+constexpr Command kCommands[] = {
+   {"build", "build SNAPSHOT.json -o FILE", "make a cache file from a snapshot", Build},
+   {"dump", "dump FILE", "write a cache file as a snapshot", Dump},
+   {"--tool-build-date", "--tool-build-date", "the build date the tools carry", ToolBuildDate},
+   {"--tool-signature", "--tool-signature", "the tree signature the tools expect", ToolSignature},
+   {"--help|-h|help", "--help", "", Help},
+};
+
+bool HasName(const Command &c, std::string_view word) {
+   for (std::string_view names = c.names;;) {
+      size_t bar = names.find('|');
+      if (names.substr(0, bar) == word) return true;
+      if (bar == std::string_view::npos) return false;
+      names.remove_prefix(bar + 1);
+   }
+}
+
+void PrintUsage(FILE *out) {
+   const char *lead = "usage:";
+   for (const Command &c : kCommands) {
+      if (c.about.empty()) {
+         std::fprintf(out, "%-6s kelcache %.*s\n", lead, int(c.usage.size()), c.usage.data());
+      } else {
+         std::fprintf(out, "%-6s kelcache %-29.*s %.*s\n", lead, int(c.usage.size()), c.usage.data(),
+                      int(c.about.size()), c.about.data());
+      }
+      lead = "";
+   }
+   std::fprintf(out, "The snapshot format is described in docs/snapshot-format.md.\n");
+}
 
 int Usage(const std::string &problem) {
-   std::cerr << "kelcache: " << problem << "\n" << kUsage;
+   std::fprintf(stderr, "kelcache: %s\n", problem.c_str());
+   PrintUsage(stderr);
    return 2;
 }
 
-bool ReadFile(const std::string &path, std::string *bytes) {
-   std::ifstream in(path, std::ios::binary);
-   if (!in) return false;
-   std::ostringstream s;
-   s << in.rdbuf();
-   *bytes = std::move(s).str();
-   return !in.bad();
-}
-
-// Writes beside the target and renames, so that a failed run leaves no half file.
-bool WriteFile(const std::string &path, const std::string &bytes) {
-   std::string tmp = path + ".tmp";
-   {
-      std::ofstream out(tmp, std::ios::binary | std::ios::trunc);
-      if (!out || !out.write(bytes.data(), std::streamsize(bytes.size())) || !out.flush()) {
-         std::remove(tmp.c_str());
-         return false;
-      }
-   }
-   if (std::rename(tmp.c_str(), path.c_str()) != 0) {
-      int saved = errno;
-      std::remove(tmp.c_str());
-      errno = saved;
-      return false;
-   }
-   return true;
-}
-
-int Build(const std::vector<std::string> &args) {
-   std::string input, output;
-   bool haveOutput = false;
-   for (size_t i = 0; i < args.size(); i++) {
-      if (args[i] == "-o") {
-         if (i + 1 == args.size()) return Usage("-o needs a file name");
-         output = args[++i];
-         haveOutput = true;
-      } else if (input.empty() && !args[i].empty() && args[i][0] != '-') {
-         input = args[i];
-      } else {
-         return Usage("unexpected argument '" + args[i] + "'");
-      }
-   }
-   if (input.empty() || !haveOutput) return Usage("build needs a snapshot and -o FILE");
-
-   std::string json, bytes, error;
-   if (!ReadFile(input, &json)) {
-      std::cerr << "kelcache: " << input << ": " << std::strerror(errno) << "\n";
-      return 1;
-   }
-   if (!BuildCache(json, &bytes, &error)) {
-      std::cerr << "kelcache: " << error << "\n";
-      return 1;
-   }
-   if (!WriteFile(output, bytes)) {
-      std::cerr << "kelcache: " << output << ": " << std::strerror(errno) << "\n";
+// Standard output is checked once written: a full disk is a failure.
+int Flushed() {
+   if (std::fflush(stdout) != 0 || std::ferror(stdout)) {
+      std::fprintf(stderr, "kelcache: write error: %s\n", std::strerror(errno));
       return 1;
    }
    return 0;
 }
 
-int Dump(const std::vector<std::string> &args) {
+// Reads a regular file whole.  Opening never waits, so a FIFO is refused
+// at once instead of blocking until a writer comes.
+bool ReadRegularFile(const char *path, std::string *bytes, std::string *problem) {
+   int fd = open(path, O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY);
+   if (fd < 0) {
+      *problem = std::strerror(errno);
+      return false;
+   }
+   struct stat st;
+   bool ok = fstat(fd, &st) == 0;
+   if (!ok) {
+      *problem = std::strerror(errno);
+   } else if (!S_ISREG(st.st_mode)) {
+      *problem = "not a regular file";
+      ok = false;
+   }
+   bytes->clear();
+   char chunk[65536];
+   while (ok) {
+      ssize_t n = read(fd, chunk, sizeof chunk);
+      if (n < 0 && errno == EINTR) continue;
+      if (n < 0) {
+         *problem = std::strerror(errno);
+         ok = false;
+      }
+      if (n <= 0) break;
+      bytes->append(chunk, size_t(n));
+   }
+   close(fd);
+   return ok;
+}
+
+bool WriteAll(int fd, const std::string &bytes) {
+   for (size_t done = 0; done < bytes.size();) {
+      ssize_t n = write(fd, bytes.data() + done, bytes.size() - done);
+      if (n < 0 && errno == EINTR) continue;
+      if (n == 0) errno = EIO;
+      if (n <= 0) return false;
+      done += size_t(n);
+   }
+   return true;
+}
+
+// Replaces the regular file at path, or makes it.  The bytes go to a new
+// temporary in the same folder (mkstemp creates it, so no link is followed
+// and nothing that exists is reused), which is then renamed over path: a
+// failed run leaves the old file as it was.  Anything else at path (a link,
+// a folder, a FIFO, a device) is refused, never replaced.
+bool WriteCacheFile(const std::string &path, const std::string &bytes, std::string *problem) {
+   struct stat st;
+   if (lstat(path.c_str(), &st) == 0) {
+      if (!S_ISREG(st.st_mode)) {
+         *problem = "exists and is not a regular file";
+         return false;
+      }
+   } else if (errno != ENOENT) {
+      *problem = std::strerror(errno);
+      return false;
+   }
+   size_t slash = path.rfind('/');
+   std::string folder = slash == std::string::npos ? "." : slash == 0 ? "/" : path.substr(0, slash);
+   std::string name = folder + "/.kelcache-XXXXXX";
+   int fd = mkstemp(name.data());
+   if (fd < 0) {
+      *problem = std::strerror(errno);
+      return false;
+   }
+   // mkstemp makes the file private; a cache file gets the usual mode.
+   mode_t mask = umask(0);
+   umask(mask);
+   bool ok = fchmod(fd, 0666 & ~mask) == 0 && WriteAll(fd, bytes);
+   int error = ok ? 0 : errno;
+   if (close(fd) != 0 && ok) {
+      ok = false;
+      error = errno;
+   }
+   if (ok && rename(name.c_str(), path.c_str()) != 0) {
+      ok = false;
+      error = errno;
+   }
+   if (ok) return true;
+   unlink(name.c_str());
+   *problem = std::strerror(error);
+   return false;
+}
+
+int Build(Args args) {
+   std::string input, output;
+   bool haveOutput = false;
+   for (size_t i = 0; i < args.size(); i++) {
+      std::string_view word = args[i];
+      if (word == "-o") {
+         if (i + 1 == args.size()) return Usage("-o needs a file name");
+         output = args[++i];
+         haveOutput = true;
+      } else if (input.empty() && !word.empty() && word[0] != '-') {
+         input = word;
+      } else {
+         return Usage("unexpected argument '" + std::string(word) + "'");
+      }
+   }
+   if (input.empty() || !haveOutput) return Usage("build needs a snapshot and -o FILE");
+
+   std::string json, bytes, problem;
+   if (!ReadRegularFile(input.c_str(), &json, &problem)) {
+      std::fprintf(stderr, "kelcache: %s: %s\n", input.c_str(), problem.c_str());
+      return 1;
+   }
+   if (!BuildCache(json, &bytes, &problem)) {
+      std::fprintf(stderr, "kelcache: %s\n", problem.c_str());
+      return 1;
+   }
+   if (!WriteCacheFile(output, bytes, &problem)) {
+      std::fprintf(stderr, "kelcache: %s: %s\n", output.c_str(), problem.c_str());
+      return 1;
+   }
+   return 0;
+}
+
+int Dump(Args args) {
    if (args.size() != 1) return Usage("dump needs exactly one cache file");
-   std::string bytes, json, error;
-   if (!ReadFile(args[0], &bytes)) {
-      std::cerr << "kelcache: " << args[0] << ": " << ORX_ReturnStatusToString(KEL_STATUS_CACHE_OPEN) << " ("
-                << std::strerror(errno) << ")\n";
+   const char *path = args[0];
+   // The reader maps the file and checks its header before anything else,
+   // so a hostile size is refused at once instead of read into memory.
+   kelplat::CacheReader reader;
+   KEL_Status status = reader.Open(path, 0);
+   if (status != KEL_STATUS_OK) {
+      std::string detail;
+      struct stat st;
+      if (status == KEL_STATUS_CACHE_OPEN)
+         detail = stat(path, &st) != 0     ? std::string(" (") + std::strerror(errno) + ")"
+                  : !S_ISREG(st.st_mode) ? " (not a regular file)"
+                                          : "";
+      std::fprintf(stderr, "kelcache: %s: %s%s\n", path, ORX_ReturnStatusToString(status), detail.c_str());
       return 1;
    }
-   if (!DumpCache(bytes, &json, &error)) {
-      std::cerr << "kelcache: " << args[0] << ": " << error << "\n";
+   std::string json, error;
+   if (!DumpCache(reader.Bytes(), &json, &error)) {
+      std::fprintf(stderr, "kelcache: %s: %s\n", path, error.c_str());
       return 1;
    }
-   std::cout << json << std::flush;
-   return std::cout ? 0 : 1;
+   std::fwrite(json.data(), 1, json.size(), stdout);
+   return Flushed();
+}
+
+int ToolBuildDate(Args args) {
+   if (!args.empty()) return Usage("--tool-build-date takes no arguments");
+   std::printf("%s\n", kelplat::ToolBuildDate());
+   return Flushed();
+}
+
+int ToolSignature(Args args) {
+   if (!args.empty()) return Usage("--tool-signature takes no arguments");
+   for (uint8_t b : kelplat::ToolSignature()) std::printf("%02x", b);
+   std::printf("\n");
+   return Flushed();
+}
+
+int Help(Args) {
+   PrintUsage(stdout);
+   return Flushed();
 }
 
 }  // namespace
 
 int main(int argc, char **argv) {
-   std::vector<std::string> args(argv + 1, argv + argc);
-   if (args.empty()) return Usage("no command given");
-   std::string command = args[0];
-   args.erase(args.begin());
-   if (command == "--help" || command == "-h" || command == "help") {
-      std::cout << kUsage;
-      return 0;
-   }
-   if (command == "--tool-build-date" && args.empty()) {
-      std::cout << kelplat::ToolBuildDate() << "\n";
-      return 0;
-   }
-   if (command == "--tool-signature" && args.empty()) {
-      char hex[3];
-      for (uint8_t b : kelplat::ToolSignature()) {
-         std::snprintf(hex, sizeof hex, "%02x", b);
-         std::cout << hex;
-      }
-      std::cout << "\n";
-      return 0;
-   }
-   if (command == "build") return Build(args);
-   if (command == "dump") return Dump(args);
-   return Usage("unknown command '" + command + "'");
+   if (argc < 2) return Usage("no command given");
+   std::string_view word = argv[1];
+   Args rest(argv + 2, size_t(argc - 2));
+   for (const Command &c : kCommands)
+      if (HasName(c, word)) return c.run(rest);
+   return Usage("unknown command '" + std::string(word) + "'");
 }

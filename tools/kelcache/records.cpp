@@ -339,7 +339,8 @@ RecordEntry EncodeRecord(const kelplat::NodeInfo &node, const Json &value, const
       PutBytes(buf, *FindField(def, "data"), text, tableTextPath);
       tableSize = text.size();
    }
-   if ((def.flags & kAcpiBuffer) && !haveLength) PutUint(buf, 5, 4, tableSize.value_or(0));
+   // Only table bytes given set the default length; "$raw" bytes stay as they are.
+   if ((def.flags & kAcpiBuffer) && !haveLength && tableSize) PutUint(buf, 5, 4, *tableSize);
    if (unlinked != nullptr && ReadBool(*unlinked, unlinkedPath)) {
       if (haveLinkState) Fail(unlinkedPath, "give linkState or unlinked, not both");
       PutUint(buf, 20, 4, uint32_t(-4));

@@ -24,7 +24,7 @@ struct Field {
 
 enum RecordFlags : uint32_t {
    kWholeText = 1,   // one text fills the buffer; a plain JSON string may stand for the record
-   kAcpiBuffer = 2,  // "length" defaults to the size of "data" (or "text")
+   kAcpiBuffer = 2,  // "length" defaults to the size of "data" (or "text") when one is given
    kInodeStats = 4,  // "unlinked": true is short for "linkState": -4
 };
 
