@@ -5,7 +5,8 @@
 # i386 GoogleTest libraries (a static library without other i386 packages).
 set -eu
 packages="g++ g++-multilib clang libclang-rt-14-dev cmake ninja-build make python3 googletest libgtest-dev
-libgtest-dev:i386 libbenchmark-dev nlohmann-json3-dev hwdata pciutils coreutils hyperfine qemu-user-static"
+libgtest-dev:i386 libbenchmark-dev nlohmann-json3-dev hwdata pciutils coreutils hyperfine qemu-user-static
+groff-base man-db dpkg-dev"
 export DEBIAN_FRONTEND=noninteractive
 updated=""
 if ! dpkg --print-foreign-architectures | grep -qx i386; then
