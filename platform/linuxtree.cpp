@@ -7,6 +7,7 @@
 #include <dirent.h>
 #include <fcntl.h>
 #include <linux/rtc.h>
+#include <sched.h>
 #include <sys/ioctl.h>
 #include <sys/stat.h>
 #include <sys/statfs.h>
@@ -115,9 +116,12 @@ void PutU16(std::string &r, size_t at, uint16_t v) {
 }
 void PutU32(std::string &r, size_t at, uint32_t v) { StoreU32(reinterpret_cast<uint8_t *>(r.data() + at), v); }
 void PutU64(std::string &r, size_t at, uint64_t v) { StoreU64(reinterpret_cast<uint8_t *>(r.data() + at), v); }
-// A text cut to width - 1 bytes and NUL-terminated.
+// A text cut to width - 1 bytes and NUL-terminated.  Records are kept only
+// as long as their last non-zero byte (a read zero-fills the rest), so the
+// record grows to hold the text when needed.
 void PutText(std::string &r, size_t at, size_t width, std::string_view text) {
    size_t n = std::min(text.size(), width - 1);
+   if (r.size() < at + n + 1) r.resize(at + n + 1);
    std::memcpy(r.data() + at, text.data(), n);
    r[at + n] = '\0';
 }
@@ -215,6 +219,28 @@ const char *FdType(mode_t mode) {
    }
 }
 
+// The CPUs a thread may run on, as Cpus_allowed_list writes them ("0-3,6").
+// sched_getaffinity answers without /proc's status text.
+std::string Affinity(int64_t tid) {
+   cpu_set_t set;
+   CPU_ZERO(&set);
+   if (sched_getaffinity(pid_t(tid), sizeof set, &set) != 0) return "";
+   std::string out;
+   for (int cpu = 0; cpu < CPU_SETSIZE;) {
+      if (!CPU_ISSET(cpu, &set)) {
+         cpu++;
+         continue;
+      }
+      int last = cpu;
+      while (last + 1 < CPU_SETSIZE && CPU_ISSET(last + 1, &set)) last++;
+      if (!out.empty()) out += ',';
+      out += std::to_string(cpu);
+      if (last > cpu) out += '-' + std::to_string(last);
+      cpu = last + 1;
+   }
+   return out;
+}
+
 // One thread, as read during the pass.
 struct Task {
    int64_t tid;
@@ -246,24 +272,40 @@ private:
    bool ReadProcess(int64_t pid, Process *p);
    void Descriptors(int procDir, int64_t pid);
    void Mappings(int procDir, int64_t pid);
-   uint32_t Userspace(int procDir, std::string_view status);
+   uint32_t Userspace(int procDir, int64_t pid, bool *namespaceInit);
 
    LinuxTree &t_;
    std::map<std::string, uint32_t> namespaces_;  // PID namespace link to userspace ID
+   std::string rootNamespace_;
    std::map<std::string, uint32_t> modules_;     // module name to module ID
    uint32_t pcpus_ = 1;
 };
 
-uint32_t Capturer::Userspace(int procDir, std::string_view status) {
-   // NSpid lists the process's ID in each PID namespace, outermost first;
-   // one entry: the namespace of the /proc being read.
-   std::string_view nspid = StatusField(status, "NSpid");
-   size_t depth = 1 + size_t(std::count(nspid.begin(), nspid.end(), '\t'));
+uint32_t Capturer::Userspace(int procDir, int64_t pid, bool *namespaceInit) {
+   // The namespace of the /proc being read is that of its PID 1.  A process
+   // whose namespace link names it (or PID 1 itself) is in it; for any other
+   // the status file's NSpid (its ID in each namespace, outermost first)
+   // says how deep it is and whether it is its namespace's first process.
+   if (rootNamespace_.empty()) {
+      char link[64];
+      ssize_t n = readlink("/proc/1/ns/pid", link, sizeof link - 1);
+      rootNamespace_ = n > 0 ? std::string(link, size_t(n)) : "unreadable";
+      namespaces_[rootNamespace_] = 1;
+   }
    char link[64];
    ssize_t n = readlinkat(procDir, "ns/pid", link, sizeof link - 1);
-   std::string name = n > 0 ? std::string(link, size_t(n)) : depth == 1 ? "root" : "depth " + std::to_string(depth);
-   if (depth == 1 && namespaces_.count("root") == 0) namespaces_["root"] = 1;
-   if (depth == 1 && n > 0 && namespaces_.count(name) == 0) namespaces_[name] = namespaces_["root"];
+   std::string name = n > 0 ? std::string(link, size_t(n)) : "";
+   *namespaceInit = pid == 1;
+   if (name != rootNamespace_ && pid != 1) {
+      std::string status;
+      ReadAt(procDir, "status", &status);
+      std::string_view nspid = StatusField(status, "NSpid");
+      size_t depth = 1 + size_t(std::count(nspid.begin(), nspid.end(), '\t'));
+      size_t tab = nspid.rfind('\t');
+      *namespaceInit = (tab == std::string_view::npos ? nspid : nspid.substr(tab + 1)) == "1";
+      if (depth == 1) name = rootNamespace_;
+      else if (name.empty()) name = "depth " + std::to_string(depth);
+   }
    auto it = namespaces_.find(name);
    if (it != namespaces_.end()) return it->second;
    uint32_t next = 1;
@@ -276,27 +318,20 @@ bool Capturer::ReadProcess(int64_t pid, Process *p) {
    char name[24];
    std::snprintf(name, sizeof name, "/proc/%lld", static_cast<long long>(pid));
    Fd dir(open(name, O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-   std::string text, status;
+   std::string text;
    if (dir.fd < 0 || !ReadAt(dir.fd, "stat", &text) || !ParseStat(text, &p->stat)) return false;
    p->pid = pid;
    p->kernel = (p->stat.flags & kKernelThread) != 0;
-   ReadAt(dir.fd, "status", &status);
-   if (!p->kernel) {
-      p->userspace = Userspace(dir.fd, status);
-      std::string_view nspid = StatusField(status, "NSpid");
-      size_t tab = nspid.rfind('\t');
-      p->namespaceInit = (tab == std::string_view::npos ? nspid : nspid.substr(tab + 1)) == "1";
-   }
+   if (!p->kernel) p->userspace = Userspace(dir.fd, pid, &p->namespaceInit);
    if (!ReadAt(dir.fd, "cmdline", &text)) return false;
    p->cmdline = CommandLineFrom(text, p->stat.comm);
 
    Dir tasks = OpenDirAt(dir.fd, "task");
    if (tasks.dir == nullptr) return false;
    for (int64_t tid : NumberedEntries(tasks.dir)) {
-      Task task{tid, {}, {}};
+      Task task{tid, {}, Affinity(tid)};
       if (tid == pid) {
          task.stat = p->stat;
-         task.affinity = std::string(StatusField(status, "Cpus_allowed_list"));
       } else {
          char sub[48];
          std::snprintf(sub, sizeof sub, "%lld/stat", static_cast<long long>(tid));
@@ -304,10 +339,6 @@ bool Capturer::ReadProcess(int64_t pid, Process *p) {
             t_.Skip("threads ended during the capture");
             continue;
          }
-         std::snprintf(sub, sizeof sub, "%lld/status", static_cast<long long>(tid));
-         std::string taskStatus;
-         if (ReadAt(dirfd(tasks.dir), sub, &taskStatus))
-            task.affinity = std::string(StatusField(taskStatus, "Cpus_allowed_list"));
       }
       p->tasks.push_back(std::move(task));
    }
@@ -334,7 +365,7 @@ void Capturer::Descriptors(int procDir, int64_t pid) {
       if (n < 0) continue;  // closed meanwhile
       struct stat st;
       const char *type = fstatat(dirfd(fds.dir), name, &st, 0) == 0 ? FdType(st.st_mode) : "UNKNOWN";
-      std::string r(fdrec::kSize, '\0');
+      std::string r(fdrec::kDescription, '\0');
       PutText(r, fdrec::kType, fdrec::kDescription - fdrec::kType, type);
       PutText(r, fdrec::kDescription, fdrec::kSize - fdrec::kDescription, std::string_view(target, size_t(n)));
       Key keys[2] = {cartel, IntKey(fd)};
@@ -364,7 +395,7 @@ void Capturer::Mappings(int procDir, int64_t pid) {
       int pathAt = 0;
       if (std::sscanf(line.c_str(), "%llx-%llx %7s %*s %*s %*s %n", &start, &stop, perms, &pathAt) < 3) continue;
       std::string_view path = pathAt > 0 ? std::string_view(line).substr(size_t(pathAt)) : std::string_view();
-      std::string r(mmaprec::kSize, '\0');
+      std::string r(mmaprec::kDescription, '\0');
       // Lengths beyond the 32-bit field are stored as 0xffffffff.
       uint64_t length = stop - start;
       PutU32(r, mmaprec::kLength, length > 0xffffffffu ? 0xffffffffu : uint32_t(length));
@@ -414,18 +445,18 @@ void Capturer::Processes() {
          PutU32(info, worldinfo::kSessionId, uint32_t(task.stat.session));
          PutU32(info, worldinfo::kTypeBits, (p.kernel ? kSystemWorld : kUserWorld) | (leader ? 0 : kCloneWorld));
          t_.AddRecord(KEL_NODE_world_info, std::span(&world, 1), KEL_STATUS_OK, std::move(info));
-         std::string name(kWorldNameSize, '\0');
+         std::string name;
          PutText(name, 0, kWorldNameSize, task.stat.comm);
          t_.AddRecord(KEL_NODE_world_name, std::span(&world, 1), KEL_STATUS_OK, std::move(name));
 
          uint32_t run, wait;
          States(task.stat.state, &run, &wait);
-         std::string summary(summarystats::kSize, '\0');
+         std::string summary(summarystats::kWaitState + 4, '\0');
          PutU32(summary, summarystats::kRunState, run);
          PutU32(summary, summarystats::kWaitState, wait);
          t_.AddRecord(KEL_NODE_sched_Vcpus_stats_summaryStats, std::span(&world, 1), KEL_STATUS_OK,
                       std::move(summary));
-         std::string affinity(affinity::kSize, '\0');
+         std::string affinity;
          PutText(affinity, affinity::kText, affinity::kSize, task.affinity);
          t_.AddRecord(KEL_NODE_sched_Vcpus_stats_affinity, std::span(&world, 1), KEL_STATUS_OK,
                       std::move(affinity));
@@ -438,7 +469,7 @@ void Capturer::Processes() {
       if (p.kernel) continue;
       Key cartel = IntKey(p.pid);
       cartels.push_back(cartel);
-      std::string cmdline(kCmdlineSize, '\0');
+      std::string cmdline;
       PutText(cmdline, 0, kCmdlineSize, p.cmdline);
       t_.AddRecord(KEL_NODE_userworld_cartel_cmdline, std::span(&cartel, 1), KEL_STATUS_OK, std::move(cmdline));
       std::vector<Key> kids;
@@ -707,12 +738,11 @@ void Capturer::Acpi() {
       size_t at = 0;
       do {
          size_t n = std::min<size_t>(bytes.size() - at, acpibuffer::kDataMax);
-         std::string r(acpibuffer::kSize, '\0');
+         std::string r(acpibuffer::kData, '\0');
          std::memcpy(r.data(), names[i].first.data(), std::min<size_t>(4, names[i].first.size()));
          PutU32(r, acpibuffer::kLength, uint32_t(n));
-         std::memcpy(r.data() + acpibuffer::kData, bytes.data() + at, n);
+         r.append(bytes, at, n);
          Key keys[2] = {table, IntKey(int64_t(buffers.size()))};
-         r.resize(acpibuffer::kData + n);  // a read zero-fills the rest
          t_.AddRecord(KEL_NODE_hardware_acpi_tables_buffers, keys, KEL_STATUS_OK, std::move(r));
          buffers.push_back(keys[1]);
          at += n;
@@ -772,7 +802,7 @@ void Capturer::System() {
    // Boot: the kernel command line; no boot switches or option files on Linux.
    std::string cmdline;
    ReadFile("/proc/cmdline", &cmdline);
-   std::string boot(bootcmdline::kSize, '\0');
+   std::string boot;
    PutText(boot, 0, bootcmdline::kSize, Trimmed(cmdline));
    t_.AddRecord(KEL_NODE_system_bootCmdLine, {}, KEL_STATUS_OK, std::move(boot));
    t_.AddRecord(KEL_NODE_system_bootOption, {}, KEL_STATUS_OK, std::string(bootoption::kSize, '\0'));
@@ -862,6 +892,9 @@ void LinuxTree::AddLevel(std::string_view levelPath, std::span<const Key> keys, 
 }
 
 void LinuxTree::AddRecord(KEL_Node node, std::span<const Key> keys, uint32_t status, std::string record) {
+   // A read zero-fills what a stored record lacks, so trailing zeros need no room.
+   size_t end = record.find_last_not_of('\0');
+   record.resize(end == std::string::npos ? 0 : end + 1);
    records_[EncodeLookup(Op::Get, node, keys)] = Record{status, std::move(record)};
 }
 
