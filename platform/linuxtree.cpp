@@ -15,6 +15,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <cctype>
 #include <cerrno>
 #include <cmath>
 #include <cstdio>
@@ -378,7 +379,7 @@ void Capturer::Descriptors(int procDir, int64_t pid) {
 void Capturer::Mappings(int procDir, int64_t pid) {
    Key cartel = IntKey(pid);
    std::string maps;
-   if (!ReadAt(procDir, "maps", &maps) || (maps.empty() && errno == EACCES)) {
+   if (!ReadAt(procDir, "maps", &maps)) {
       t_.AddLevel("userworld/cartel/#/mem/mmaps/#", std::span(&cartel, 1), kDenied, {});
       t_.Skip("processes' mappings (permission denied)");
       return;
@@ -540,7 +541,7 @@ void Capturer::Pci() {
    }
    // segment -> bus -> slot -> functions
    std::map<int64_t, std::map<int64_t, std::map<int64_t, std::set<int64_t>>>> tree;
-   bool configShort = false;
+   unsigned configShort = 0;
    while (dirent *e = readdir(devices.dir)) {
       unsigned seg, bus, slot, func;
       if (std::sscanf(e->d_name, "%x:%x:%x.%x", &seg, &bus, &slot, &func) != 4) continue;
@@ -600,11 +601,12 @@ void Capturer::Pci() {
          t_.AddRecord(KEL_NODE_hardware_pci_seg_bus_slot_func_pciConfigSpace, keys, KEL_STATUS_OK,
                       config.substr(0, pciconfigspace::kSize));
       else
-         configShort = true;
+         configShort++;
       if (config.size() >= pciextconfigspace::kSize)
          t_.AddRecord(KEL_NODE_hardware_pci_seg_bus_slot_func_pciExtConfigSpace, keys, KEL_STATUS_OK, config);
    }
-   if (configShort) t_.Skip("PCI configuration spaces (only root reads past the first 64 bytes)");
+   if (configShort > 0)
+      t_.Skip("PCI functions' configuration spaces (only root reads past the first 64 bytes)", configShort);
    std::vector<Key> segs;
    for (const auto &[seg, buses] : tree) {
       segs.push_back(IntKey(seg));

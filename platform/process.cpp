@@ -6,6 +6,7 @@
 #include <cerrno>
 #include <cstdio>
 #include <cstdlib>
+#include <new>
 #include <string>
 
 #include "cachefile.h"
@@ -55,9 +56,19 @@ bool SimulatorMaySignal(int32_t pid) {
 }  // namespace
 
 extern "C" int OrxProc_Signal(int32_t pid, int signal) {
-   if (kelplat::InSimulator() && !SimulatorMaySignal(pid)) {
-      errno = ESRCH;
-      return -1;
+   if (kelplat::InSimulator()) {
+      // No exception leaves the call: memory running out refuses the signal.
+      bool may = false;
+      try {
+         may = SimulatorMaySignal(pid);
+      } catch (const std::bad_alloc &) {
+         errno = ENOMEM;
+         return -1;
+      }
+      if (!may) {
+         errno = ESRCH;
+         return -1;
+      }
    }
    // Tests set the variable so that no process is ever signalled.
    if (const char *record = std::getenv("ORXKEL_SIGNAL_RECORD")) return RecordSignal(record, pid, signal);
