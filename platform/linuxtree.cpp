@@ -278,6 +278,7 @@ private:
    LinuxTree &t_;
    std::map<std::string, uint32_t> namespaces_;  // PID namespace link to userspace ID
    std::string rootNamespace_;
+   bool rootKnown_ = false;
    std::map<std::string, uint32_t> modules_;     // module name to module ID
    uint32_t pcpus_ = 1;
 };
@@ -287,23 +288,33 @@ uint32_t Capturer::Userspace(int procDir, int64_t pid, bool *namespaceInit) {
    // whose namespace link names it (or PID 1 itself) is in it; for any other
    // the status file's NSpid (its ID in each namespace, outermost first)
    // says how deep it is and whether it is its namespace's first process.
+   // PID 1's link may be unreadable even for root (a sandbox); then the first
+   // process NSpid places in /proc's namespace names it.
    if (rootNamespace_.empty()) {
       char link[64];
       ssize_t n = readlink("/proc/1/ns/pid", link, sizeof link - 1);
-      rootNamespace_ = n > 0 ? std::string(link, size_t(n)) : "unreadable";
+      rootKnown_ = n > 0;
+      rootNamespace_ = rootKnown_ ? std::string(link, size_t(n)) : "/proc's own";
       namespaces_[rootNamespace_] = 1;
    }
    char link[64];
    ssize_t n = readlinkat(procDir, "ns/pid", link, sizeof link - 1);
    std::string name = n > 0 ? std::string(link, size_t(n)) : "";
    *namespaceInit = pid == 1;
-   if (name != rootNamespace_ && pid != 1) {
+   if (pid == 1) {
+      name = rootNamespace_;
+   } else if (name != rootNamespace_) {
       std::string status;
       ReadAt(procDir, "status", &status);
       std::string_view nspid = StatusField(status, "NSpid");
       size_t depth = 1 + size_t(std::count(nspid.begin(), nspid.end(), '\t'));
       size_t tab = nspid.rfind('\t');
       *namespaceInit = (tab == std::string_view::npos ? nspid : nspid.substr(tab + 1)) == "1";
+      if (depth == 1 && !rootKnown_ && !name.empty()) {
+         rootNamespace_ = name;
+         rootKnown_ = true;
+         namespaces_[name] = 1;
+      }
       if (depth == 1) name = rootNamespace_;
       else if (name.empty()) name = "depth " + std::to_string(depth);
    }

@@ -229,6 +229,17 @@ def main():
         else:
             ok("ps -u: all %d tasks that lived through the capture are listed" % len(lived))
 
+        # PID 1 of the /proc read is the first process of userspace 1, and
+        # so are the case's own processes when they share its namespace.
+        with open("/proc/%d/status" % os.getpid()) as f:
+            nspid = [l for l in f if l.startswith("NSpid:")]
+        same = not nspid or len(nspid[0].split()) == 2
+        spaces = tool_out("userspaceof", "1", str(holder.pid)).stdout.split()
+        if spaces == ["1", "1"] or (not same and spaces[:1] == ["1"]):
+            ok("userspaceof: PID 1 and the case's process are in userspace 1")
+        else:
+            fail("userspaceof 1 %d: %r" % (holder.pid, spaces))
+
         # lsof shows the held file on descriptor 7.
         rows = [l.split() for l in tool_out("lsof").stdout.splitlines()]
         if any(r[:1] == [str(holder.pid)] and "7" in r and held in r for r in rows):
