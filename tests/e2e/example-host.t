@@ -3,7 +3,9 @@ that find something, exits with 0 and prints what the host holds.
 
 pkill, vdu and bootOption -c/-C need live mode and run through the simulator.
 pkill runs with the recording mode, since the example's cartel IDs are made
-up: the signals land in @TMP/sig and no process is signalled.  vdu walks a copy
+up: the signals land in @TMP/sig and no process is signalled.  The example's
+command lines are invented, so the simulator signals none of its cartels
+unless a snapshot allows any process (example-any).  vdu walks a copy
 of examples/corafs made next to the cache, where the example's relative
 corafsRoot ("corafs") points; the cases name their paths from the case's
 folder, so the root is the same whether it is taken relative to the snapshot
@@ -15,6 +17,8 @@ Raw bytes (pci-info) go through od; the 4096-byte dumps of lspci -e leave out
 their rows of zeros.
 
 === snapshot example from ../../examples/host.json
+=== snapshot example-any extends example
+{"simulator": {"signalAnyProcess": true}}
 === case ps: every world
 snapshot: example
 run: ps
@@ -139,15 +143,22 @@ run: pgrep -lf config.xml
 exit: 0
 --- stdout
 1002 /usr/sbin/hostd -c /etc/hostd/config.xml
-=== case pkill through the simulator, recorded: HUP to agentd's cartel only
+=== case pkill through the simulator: the example's invented command lines match no process here, so nothing is signalled
 snapshot: example
+mode: sim
+env: ORXKEL_SIGNAL_RECORD=@TMP/sig
+run: pkill -HUP agentd
+check: test ! -e sig
+exit: 0
+=== case pkill through the simulator, recorded: HUP to agentd's cartel only
+snapshot: example-any
 mode: sim
 env: ORXKEL_SIGNAL_RECORD=@TMP/sig
 run: pkill -HUP agentd
 check: test "$(cat sig)" = "1003 1"
 exit: 0
 === case pkill -f: TERM to the shell that runs collect.sh
-snapshot: example
+snapshot: example-any
 mode: sim
 env: ORXKEL_SIGNAL_RECORD=@TMP/sig
 run: pkill -f collect.sh

@@ -9,33 +9,33 @@ shells the case starts; a shell's cartel ID is its process ID, and each
 shell writes the names of the signals it catches to NAME.sig.
 
 === snapshot recorded
-{"buildDate": "Nov 30 2026",
+{"buildDate": "Nov 30 2026", "simulator": {"signalAnyProcess": true},
  "tree": {"userworld": {"cartel": {
    "2147480001": {"cmdline": "/usr/sbin/crond -f"},
    "2147483000": {"cmdline": {"$status": "0xbad0062"}},
    "2147480002": {"cmdline": "sshd -D"}
  }}}}
 === snapshot bad-cmdline
-{"buildDate": "Nov 30 2026",
+{"buildDate": "Nov 30 2026", "simulator": {"signalAnyProcess": true},
  "tree": {"userworld": {"cartel": {
    "2147480001": {"cmdline": "/usr/sbin/crond -f"},
    "2147483000": {"cmdline": {"$status": "0xbad0003"}},
    "2147480002": {"cmdline": "crond"}
  }}}}
 === snapshot self
-{"buildDate": "Nov 30 2026",
+{"buildDate": "Nov 30 2026", "simulator": {"signalAnyProcess": true},
  "tree": {"userworld": {"cartel": {
    "$int:@SELF": {"cmdline": "crond"},
    "2147480001": {"cmdline": "crond"}
  }}}}
 === snapshot wide-key
-{"buildDate": "Nov 30 2026",
+{"buildDate": "Nov 30 2026", "simulator": {"signalAnyProcess": true},
  "tree": {"userworld": {"cartel": {
    "2147480001": {"cmdline": "crond"},
    "4294967297": {"cmdline": "crond"}
  }}}}
 === snapshot no-single-process
-{"buildDate": "Nov 30 2026",
+{"buildDate": "Nov 30 2026", "simulator": {"signalAnyProcess": true},
  "tree": {"userworld": {"cartel": {
    "0": {"cmdline": "crond"},
    "4294967295": {"cmdline": "crond"},
@@ -44,16 +44,16 @@ shell writes the names of the signals it catches to NAME.sig.
    "2147480001": {"cmdline": "crond"}
  }}}}
 === snapshot unlisted
-{"buildDate": "Nov 30 2026",
+{"buildDate": "Nov 30 2026", "simulator": {"signalAnyProcess": true},
  "tree": {"userworld": {"cartel": {"$listStatus": "0xbad0003"}}}}
 === snapshot two
-{"buildDate": "Nov 30 2026",
+{"buildDate": "Nov 30 2026", "simulator": {"signalAnyProcess": true},
  "tree": {"userworld": {"cartel": {
    "$int:@PID:a": {"cmdline": "/usr/sbin/crond -f"},
    "$int:@PID:b": {"cmdline": "sshd -D"}
  }}}}
 === snapshot ended
-{"buildDate": "Nov 30 2026",
+{"buildDate": "Nov 30 2026", "simulator": {"signalAnyProcess": true},
  "tree": {"userworld": {"cartel": {
    "$int:@DEAD": {"cmdline": "crond"},
    "$int:@PID:a": {"cmdline": "/usr/sbin/crond -f"}
@@ -254,3 +254,28 @@ check: ! test -e signals
 exit: 1
 --- stderr
 Using KEL cache is unsupported
+=== snapshot guarded
+{"buildDate": "Nov 30 2026",
+ "tree": {"userworld": {"cartel": {
+   "$int:@PID:a": {"cmdline": "sleep 1000"},
+   "$int:@PID:b": {"cmdline": "sleep 1001 --invented"},
+   "2147480001": {"cmdline": "sleep 1002"}
+ }}}}
+=== case without signalAnyProcess the simulator signals only a process whose command line here is the cartel's
+snapshot: guarded
+mode: sim
+env: ORXKEL_SIGNAL_RECORD=@TMP/signals
+spawn: a touch a.ready; exec sleep 1000
+spawn: b touch b.ready; exec sleep 1001
+run: pkill -f sleep
+check: test "$(cat signals)" = "@PID:a 15"
+exit: 0
+=== case without signalAnyProcess a real signal reaches the matching process, and only it
+snapshot: guarded
+mode: sim
+spawn: a touch a.ready; exec sleep 1000
+spawn: b touch b.ready; exec sleep 1001
+run: pkill -f sleep
+check: timeout 3 sh -c 'until ! test -e /proc/@PID:a || grep -q ") Z" /proc/@PID:a/stat; do sleep 0.05; done'
+check: grep -q ") S" /proc/@PID:b/stat
+exit: 0

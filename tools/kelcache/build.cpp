@@ -225,10 +225,14 @@ void Builder::Simulator(const Json &value, const std::string &path) {
             if (i > 0) text += '\n';
             text += fields[0] + '\t' + fields[1] + '\t' + fields[2] + '\t' + fields[3];
          }
+      } else if (it.key() == "signalAnyProcess") {
+         text = ReadBool(*it, p) ? "1" : "0";
       } else {
          Fail(p, "unknown member");
       }
-      Key key = MetaKey(it.key() == "corafsRoot" ? "corafs.root" : "corafs.rules");
+      Key key = MetaKey(it.key() == "corafsRoot"         ? "corafs.root"
+                        : it.key() == "signalAnyProcess" ? "signal.any"
+                                                         : "corafs.rules");
       Add(kelplat::EncodeLookup(Op::Meta, 0, std::span<const Key>(&key, 1)), KEL_STATUS_OK, text, p);
    }
 }

@@ -232,6 +232,10 @@ bool Dumper::PlaceMeta(const Entry &e, const Lookup &l) {
       simulator_["corafsRoot"] = std::string(e.data);
       return true;
    }
+   if (name == "signal.any" && (e.data == "1" || e.data == "0")) {
+      simulator_["signalAnyProcess"] = e.data == "1";
+      return true;
+   }
    if (name == "corafs.rules") {
       if (std::optional<Json> rules = DumpRules(e.data)) {
          simulator_["corafsRules"] = *rules;

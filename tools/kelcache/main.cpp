@@ -14,6 +14,7 @@
 #include <vector>
 
 #include "cachefile.h"
+#include "capture.h"
 #include "kel/kel.h"
 #include "nodetable.h"
 #include "snapshot.h"
@@ -32,6 +33,7 @@ struct Command {
 
 int Build(Args args);
 int Dump(Args args);
+int Capture(Args args);
 int ToolBuildDate(Args args);
 int ToolSignature(Args args);
 int Help(Args args);
@@ -39,6 +41,7 @@ int Help(Args args);
 constexpr Command kCommands[] = {
    {"build", "build SNAPSHOT.json -o FILE", "make a cache file from a snapshot", Build},
    {"dump", "dump FILE", "write a cache file as a snapshot", Dump},
+   {"capture", "capture [-o FILE] [--json]", "this Linux machine as a cache file or snapshot", Capture},
    {"--tool-build-date", "--tool-build-date", "the build date the tools carry", ToolBuildDate},
    {"--tool-signature", "--tool-signature", "the tree signature the tools expect", ToolSignature},
    {"--help|-h|help", "--help", "", Help},
@@ -226,6 +229,8 @@ int Dump(Args args) {
    std::fwrite(json.data(), 1, json.size(), stdout);
    return Flushed();
 }
+
+int Capture(Args args) { return RunCapture(args, WriteCacheFile); }
 
 int ToolBuildDate(Args args) {
    if (!args.empty()) return Usage("--tool-build-date takes no arguments");

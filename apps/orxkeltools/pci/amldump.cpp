@@ -10,6 +10,7 @@
 #include <cstdio>
 #include <string_view>
 
+#include "kel/hwrecords.h"
 #include "keltools.h"
 #include "records.h"
 
@@ -23,22 +24,6 @@ bool SafeSignature(std::string_view signature) {
 }
 
 namespace {
-
-// Table buffer record (KEL_NODE_hardware_acpi_tables_buffers, 131084 bytes):
-//
-//    0 table signature, 4 characters
-//    4 set to NUL here, so that bytes 0..4 are the signature as a text
-//    5 length of this buffer's data  u32 (not aligned)
-//    9 the data: its first "length" bytes are the next piece of the table
-namespace acpibuffer {
-constexpr uint32_t kSize = 131084;
-constexpr size_t kSignature = 0;
-constexpr size_t kSignatureEnd = 4;
-constexpr size_t kLength = 5;
-constexpr size_t kData = 9;
-constexpr uint32_t kDataMax = kSize - kData;
-}  // namespace acpibuffer
-static_assert(acpibuffer::kSize == KEL_RECORD_SIZE_hardware_acpi_tables_buffers);
 
 // Never replace an existing file: the open fails instead.
 constexpr int kOpenFlags = O_WRONLY | O_CREAT | O_EXCL | O_TRUNC;

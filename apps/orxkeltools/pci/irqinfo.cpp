@@ -5,37 +5,13 @@
 #include <cstring>
 #include <string_view>
 
+#include "kel/hwrecords.h"
 #include "keltools.h"
 #include "records.h"
 
 namespace {
 
 constexpr const char kUsage[] = "irqinfo:      List interrupt information\n";
-
-// CPU information record (KEL_NODE_hardware_cpu_cpuInfo, 36 bytes):
-//   16 number of physical CPUs  u32
-namespace cpuinfo {
-constexpr uint32_t kSize = 36;
-constexpr size_t kNumCpus = 16;
-}  // namespace cpuinfo
-static_assert(cpuinfo::kSize == KEL_RECORD_SIZE_hardware_cpu_cpuInfo);
-
-// Interrupt usage record (KEL_NODE_hardware_interrupts_cookieList_UsageStatus,
-// 12 bytes):
-//    8 device flag  u8   zero: the kernel's own device, shown as "<ORX device>"
-namespace irqusage {
-constexpr uint32_t kSize = 12;
-constexpr size_t kDeviceFlag = 8;
-}  // namespace irqusage
-static_assert(irqusage::kSize == KEL_RECORD_SIZE_hardware_interrupts_cookieList_UsageStatus);
-
-// Per-CPU count record (KEL_NODE_hardware_interrupts_cookieList_PCPU, 8 bytes):
-//    0 interrupts on that CPU  u64
-namespace irqcount {
-constexpr uint32_t kSize = 8;
-constexpr size_t kCount = 0;
-}  // namespace irqcount
-static_assert(irqcount::kSize == KEL_RECORD_SIZE_hardware_interrupts_cookieList_PCPU);
 
 // The most CPUs the table has columns for.  A tree that claims more is
 // refused before anything is printed, so that a hostile count cannot keep

@@ -7,9 +7,9 @@
 #include <cstring>
 #include <string_view>
 
+#include "kel/pcirecords.h"
 #include "keltools.h"
 #include "pci/pciids.h"
-#include "pci/pcirecord.h"
 #include "records.h"
 
 namespace {
@@ -44,17 +44,6 @@ constexpr char kDetailedHeader[] = "%-12s %-19s %-14s %-1s %-12s %-8s\n";
 // The walk's levels are kPciLevels; the key list holds one key per level.
 constexpr int kFunctionLevel = 4;
 
-// Module record (KEL_NODE_system_modules_general, 700 bytes):
-//
-//      0 name       text (only its first 32 bytes are used)
-//    288 module ID  u32
-namespace modulerecord {
-constexpr uint32_t kSize = 700;
-constexpr size_t kName = 0;
-constexpr size_t kNameWidth = 32;
-constexpr size_t kId = 288;
-}  // namespace modulerecord
-static_assert(modulerecord::kSize == KEL_RECORD_SIZE_system_modules_general);
 constexpr uint32_t kNoModule = 0xffffffff;
 
 struct ModuleEntry {

@@ -10,7 +10,7 @@
 
 #include "keltools.h"
 #include "numbers.h"
-#include "pci/pcirecord.h"
+#include "kel/pcirecords.h"
 #include "records.h"
 
 namespace {

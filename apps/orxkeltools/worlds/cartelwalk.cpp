@@ -4,7 +4,7 @@
 #include <cstdio>
 #include <cstring>
 
-#include "worlds/worldinfo.h"
+#include "kel/worldrecords.h"
 
 PatternResult CompilePattern(const char *command, const char *text, PatternPtr *pattern) {
    auto *re = static_cast<regex_t *>(std::malloc(sizeof(regex_t)));

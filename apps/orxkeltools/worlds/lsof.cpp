@@ -5,7 +5,7 @@
 
 #include "keltools.h"
 #include "records.h"
-#include "worlds/worldinfo.h"
+#include "kel/worldrecords.h"
 
 namespace {
 

@@ -11,7 +11,7 @@
 #include "keltools.h"
 #include "records.h"
 #include "numbers.h"
-#include "worlds/worldinfo.h"
+#include "kel/worldrecords.h"
 
 namespace {
 

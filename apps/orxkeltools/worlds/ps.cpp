@@ -19,8 +19,8 @@
 #include "numbers.h"
 #include "records.h"
 #include "worlds/psparents.h"
-#include "worlds/schedrecords.h"
-#include "worlds/worldinfo.h"
+#include "kel/schedrecords.h"
+#include "kel/worldrecords.h"
 
 namespace {
 

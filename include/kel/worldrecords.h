@@ -1,6 +1,6 @@
 // Records about worlds and cartels that the process tools read.
-#ifndef ORXKELTOOLS_WORLDS_WORLDINFO_H
-#define ORXKELTOOLS_WORLDS_WORLDINFO_H
+#ifndef KEL_WORLDRECORDS_H
+#define KEL_WORLDRECORDS_H
 
 #include <cstddef>
 #include <cstdint>

@@ -1,6 +1,6 @@
 // Records about a world's scheduling and a cartel's children, read by ps.
-#ifndef ORXKELTOOLS_WORLDS_SCHEDRECORDS_H
-#define ORXKELTOOLS_WORLDS_SCHEDRECORDS_H
+#ifndef KEL_SCHEDRECORDS_H
+#define KEL_SCHEDRECORDS_H
 
 #include <cstddef>
 #include <cstdint>

@@ -1,7 +1,7 @@
 // The PCI function record and configuration spaces, read by lspci and
 // pci-info.
-#ifndef ORXKELTOOLS_PCI_PCIRECORD_H
-#define ORXKELTOOLS_PCI_PCIRECORD_H
+#ifndef KEL_PCIRECORDS_H
+#define KEL_PCIRECORDS_H
 
 #include <cstddef>
 #include <cstdint>
@@ -71,5 +71,17 @@ namespace pciextconfigspace {
 constexpr uint32_t kSize = 4096;
 }  // namespace pciextconfigspace
 static_assert(pciextconfigspace::kSize == KEL_RECORD_SIZE_hardware_pci_seg_bus_slot_func_pciExtConfigSpace);
+
+// Module record (KEL_NODE_system_modules_general, 700 bytes):
+//
+//      0 name       text (only its first 32 bytes are used)
+//    288 module ID  u32
+namespace modulerecord {
+constexpr uint32_t kSize = 700;
+constexpr size_t kName = 0;
+constexpr size_t kNameWidth = 32;
+constexpr size_t kId = 288;
+}  // namespace modulerecord
+static_assert(modulerecord::kSize == KEL_RECORD_SIZE_system_modules_general);
 
 #endif
