@@ -1,5 +1,6 @@
 // Snapshot JSON to cache file bytes.
 #include <array>
+#include <memory>
 #include <unordered_set>
 
 #include "content.h"
@@ -15,45 +16,119 @@ namespace {
 using kelplat::Key;
 using kelplat::Op;
 
-// Parses the text, refusing a member name given twice in one object (the
-// parser would silently keep one of them).
-Json Parse(const std::string &text) {
-   struct Frame {
-      bool array;
-      size_t index = 0;
-      std::string key;
-      std::unordered_set<std::string> seen;
-   };
-   std::vector<Frame> frames;
-   auto containerPath = [&] {
-      std::string path;
-      for (size_t i = 0; i + 1 < frames.size(); i++)
-         path = frames[i].array ? ElementPath(path, frames[i].index) : MemberPath(path, frames[i].key);
-      return path;
-   };
-   auto elementDone = [&] {
-      if (!frames.empty() && frames.back().array) frames.back().index++;
-   };
-   Json::parser_callback_t callback = [&](int, Json::parse_event_t event, Json &parsed) {
-      switch (event) {
-      case Json::parse_event_t::object_start: frames.push_back({false}); break;
-      case Json::parse_event_t::array_start: frames.push_back({true}); break;
-      case Json::parse_event_t::key: {
-         Frame &f = frames.back();
-         f.key = parsed.get<std::string>();
-         if (!f.seen.insert(f.key).second) Fail(MemberPath(containerPath(), f.key), "member given twice");
-         break;
-      }
-      case Json::parse_event_t::object_end:
-      case Json::parse_event_t::array_end:
-         frames.pop_back();
-         elementDone();
-         break;
-      case Json::parse_event_t::value: elementDone(); break;
-      }
+// Builds the document from the parser's events.  Members are appended in
+// the order given (the listing order) without the ordered object's linear
+// search; a member name given twice in one object is refused (the plain
+// parser would silently keep one of them) through a hash of member indices
+// once an object has more than a few members.
+class DocumentBuilder {
+public:
+   Json root;
+
+   bool null() { return Put(nullptr); }
+   bool boolean(bool v) { return Put(v); }
+   bool number_integer(Json::number_integer_t v) { return Put(v); }
+   bool number_unsigned(Json::number_unsigned_t v) { return Put(v); }
+   bool number_float(Json::number_float_t v, const std::string &) { return Put(v); }
+   bool string(std::string &v) { return Put(std::move(v)); }
+   bool binary(Json::binary_t &v) { return Put(Json::binary(std::move(v))); }
+   bool start_object(size_t) {
+      frames_.push_back({Put(Json::object())});
       return true;
+   }
+   bool start_array(size_t) {
+      frames_.push_back({Put(Json::array())});
+      return true;
+   }
+   bool key(std::string &name);
+   bool end_object() { return Pop(); }
+   bool end_array() { return Pop(); }
+   template <class Exception>
+   bool parse_error(size_t, const std::string &, const Exception &e) {
+      throw e;
+   }
+
+private:
+   // The name of member i (the ordered object hides the vector's operator[]).
+   static const std::string &Name(const Json::object_t &members, size_t i) {
+      return members.begin()[ptrdiff_t(i)].first;
+   }
+   // Member indices of one object, hashed and compared by name.
+   struct IndexHash {
+      const Json::object_t *members;
+      size_t operator()(size_t i) const { return std::hash<std::string>()(Name(*members, i)); }
    };
-   return Json::parse(text, callback);
+   struct IndexEqual {
+      const Json::object_t *members;
+      bool operator()(size_t a, size_t b) const { return Name(*members, a) == Name(*members, b); }
+   };
+   using IndexSet = std::unordered_set<size_t, IndexHash, IndexEqual>;
+   static constexpr size_t kLinearMembers = 8;
+
+   struct Frame {
+      Json *container;
+      std::unique_ptr<IndexSet> index;  // made when the object outgrows kLinearMembers
+   };
+
+   // Places a value: the root, the next array element, or the value of the
+   // member whose name came last.
+   Json *Put(Json &&value) {
+      if (frames_.empty()) {
+         root = std::move(value);
+         return &root;
+      }
+      Json &c = *frames_.back().container;
+      if (c.is_array()) {
+         c.get_ref<Json::array_t &>().push_back(std::move(value));
+         return &c.get_ref<Json::array_t &>().back();
+      }
+      Json &slot = c.get_ref<Json::object_t &>().back().second;
+      slot = std::move(value);
+      return &slot;
+   }
+   bool Pop() {
+      frames_.pop_back();
+      return true;
+   }
+   // The JSON path of the member being added to the innermost object.
+   std::string CurrentPath() const {
+      std::string path;
+      for (const Frame &f : frames_) {
+         if (f.container->is_array())
+            path = ElementPath(path, f.container->size() - 1);
+         else
+            path = MemberPath(path, f.container->get_ref<const Json::object_t &>().back().first);
+      }
+      return path;
+   }
+
+   std::vector<Frame> frames_;
+};
+
+bool DocumentBuilder::key(std::string &name) {
+   Frame &f = frames_.back();
+   Json::object_t &members = f.container->get_ref<Json::object_t &>();
+   // The vector's own emplace_back: the ordered object's emplace searches.
+   members.emplace_back(std::move(name), nullptr);
+   size_t added = members.size() - 1;
+   bool repeated = false;
+   if (f.index) {
+      repeated = !f.index->insert(added).second;
+   } else {
+      for (size_t i = 0; i < added && !repeated; i++) repeated = Name(members, i) == Name(members, added);
+      if (!repeated && members.size() > kLinearMembers) {
+         f.index = std::make_unique<IndexSet>(members.size() * 2, IndexHash{&members}, IndexEqual{&members});
+         for (size_t i = 0; i < members.size(); i++) f.index->insert(i);
+      }
+   }
+   if (repeated) Fail(CurrentPath(), "member given twice");
+   return true;
+}
+
+Json Parse(const std::string &text) {
+   DocumentBuilder builder;
+   Json::sax_parse(text, &builder);
+   return std::move(builder.root);
 }
 
 constexpr uint64_t kMaxCacheSize = 256u << 20;
