@@ -142,7 +142,9 @@ Key MetaKey(std::string_view name) { return Key{KEL_PARAM_STRING, 0, std::string
 
 class Builder {
 public:
-   std::string Run(const Json &doc);
+   // Walks the document; each instance's value is released once stored, so
+   // that the cache grows into the memory the document gives up.
+   std::string Run(Json &doc);
 
 private:
    void Add(std::string lookup, uint32_t status, std::string data, const std::string &path) {
@@ -153,8 +155,8 @@ private:
       if (!writer_.Add(std::move(lookup), status, std::move(data)))
          Fail(path, "makes an entry that another member made already");
    }
-   void Walk(int pos, const Json &value, const std::string &path, bool instance);
-   void WalkLevel(int pos, const Json &value, const std::string &path);
+   void Walk(int pos, Json &value, const std::string &path, bool instance);
+   void WalkLevel(int pos, Json &value, const std::string &path);
    void Simulator(const Json &value, const std::string &path);
    void RawEntries(const Json &value, const std::string &path);
 
@@ -164,7 +166,7 @@ private:
    uint64_t total_ = 0;
 };
 
-std::string Builder::Run(const Json &doc) {
+std::string Builder::Run(Json &doc) {
    if (!doc.is_object()) Fail("", "expected an object");
    std::string date = "unknown";
    std::array<uint8_t, 16> signature;
@@ -195,7 +197,7 @@ std::string Builder::Run(const Json &doc) {
 // The value at a position: a record, a data content, an object of instances,
 // or an object of fixed names.  null stores nothing.  instance: the value
 // is a member of an object of instances, so it may carry "$unlisted".
-void Builder::Walk(int pos, const Json &value, const std::string &path, bool instance) {
+void Builder::Walk(int pos, Json &value, const std::string &path, bool instance) {
    if (value.is_null()) return;
    const Position &at = tree_.at(pos);
    if (at.node != nullptr && (at.node->flags & kelplat::KEL_NF_DATA)) {
@@ -229,7 +231,7 @@ void Builder::Walk(int pos, const Json &value, const std::string &path, bool ins
 }
 
 // An object of instances: its member names are the keys, in listing order.
-void Builder::WalkLevel(int pos, const Json &value, const std::string &path) {
+void Builder::WalkLevel(int pos, Json &value, const std::string &path) {
    int level = tree_.LevelChild(pos);
    const kelplat::NodeInfo *lister = tree_.at(level).node;  // the node that lists them, if any
    std::optional<uint32_t> listStatus;
@@ -259,6 +261,7 @@ void Builder::WalkLevel(int pos, const Json &value, const std::string &path) {
       if (!unlisted) listed.push_back(key);
       keys_.push_back(std::move(key));
       Walk(level, *it, p, true);
+      *it = nullptr;
       keys_.pop_back();
    }
    if (noListing && listStatus) Fail(path, "$listStatus and $noListing exclude each other");

@@ -181,22 +181,33 @@ bool Dumper::Run(const kelplat::CacheReader &reader, std::string &out, KEL_Statu
    std::sort(entries.begin(), entries.end(), [](const Entry &a, const Entry &b) { return a.key < b.key; });
 
    // Listings first, so that reads know which instances are listed; sets
-   // last, as they join the read of the same record.
-   std::vector<std::optional<Lookup>> lookups;
-   for (const Entry &e : entries) lookups.push_back(DecodeLookup(e.key));
+   // last, as they join the read of the same record.  An entry's key is
+   // decoded in the phase of its operation only, so that the decoded keys of
+   // all entries are never held at once.
+   auto phaseOf = [](std::string_view key) {
+      switch (key.empty() ? Op(0) : Op(uint8_t(key[0]))) {
+      case Op::List:
+      case Op::Meta: return 0;
+      case Op::Get:
+      case Op::Data: return 1;
+      case Op::Set: return 2;
+      default: return -1;  // an unknown operation stays raw
+      }
+   };
    std::vector<bool> placed(entries.size());
    for (int phase = 0; phase < 3; phase++) {
       for (size_t i = 0; i < entries.size(); i++) {
-         if (!lookups[i] || placed[i]) continue;
          const Entry &e = entries[i];
-         const Lookup &l = *lookups[i];
-         switch (l.op) {
-         case Op::List: placed[i] = phase == 0 && PlaceListing(e, l); break;
-         case Op::Meta: placed[i] = phase == 0 && PlaceMeta(e, l); break;
+         if (phaseOf(e.key) != phase) continue;
+         std::optional<Lookup> l = DecodeLookup(e.key);
+         if (!l) continue;
+         switch (l->op) {
+         case Op::List: placed[i] = PlaceListing(e, *l); break;
+         case Op::Meta: placed[i] = PlaceMeta(e, *l); break;
          case Op::Get:
-         case Op::Data: placed[i] = phase == 1 && PlaceRead(e, l); break;
-         case Op::Set: placed[i] = phase == 2 && PlaceSet(e, l); break;
-         default: break;  // an unknown operation stays raw
+         case Op::Data: placed[i] = PlaceRead(e, *l); break;
+         case Op::Set: placed[i] = PlaceSet(e, *l); break;
+         default: break;
          }
       }
    }
