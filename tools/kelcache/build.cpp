@@ -152,6 +152,9 @@ private:
       // snapshot makes a file of gigabytes.
       total_ += lookup.size() + data.size();
       if (total_ > kMaxCacheSize) Fail(path, "makes the cache file larger than 256 MiB");
+      // Records are made at their node's full size and then trimmed; the
+      // stored entry keeps only the bytes, not the spare capacity.
+      if (data.capacity() > data.size() + 64) data.shrink_to_fit();
       if (!writer_.Add(std::move(lookup), status, std::move(data)))
          Fail(path, "makes an entry that another member made already");
    }
