@@ -356,6 +356,13 @@ TEST(Kelcache, ErrorsNameTheirJsonPath) {
       {R"({"colour": 1})", "/colour: unknown member"},
       {R"({"tree": {"world": )", "malformed JSON: parse error at line 1"},
       {R"([1])", "/: expected an object"},
+      // A syntax error or a member given twice anywhere comes before a mistake of the content.
+      {R"({"colour": 1, "tree": {"world": {"1": {"foo": 1}}})", "malformed JSON: parse error at line 1"},
+      {R"({"tree": {"world": {"1": {"foo": 1}, "2": {}, "2": {}}}})", "/tree/world/2: member given twice"},
+      {R"({"tree": {"world": {"1": {"foo": 1}}}, "tree": 1})", "/tree: member given twice"},
+      {R"({"tree": {"world": {"1": {"foo": 1}, "2": {"info": {"worldId": 1, "worldId": 2}}}}})",
+       "/tree/world/2/info/worldId: member given twice"},
+      {R"({"tree": {"world": {"1": {"foo": 1}, "2": {"info": {"foo": 1}}}}})", "/tree/world/1/foo: no such node"},
    };
    for (const auto &c : kCases) {
       std::string error = BuildError(c.json);
