@@ -4,8 +4,8 @@
 // "tree"; that tree is then written out, listed instances in listing order.
 // An entry that the tree cannot give back byte for byte goes to "rawEntries".
 #include <algorithm>
-#include <map>
 #include <memory>
+#include <unordered_map>
 #include <unordered_set>
 
 #include "content.h"
@@ -53,14 +53,30 @@ std::string Encoded(const Key &key) {
    return out;
 }
 
-// What was found at one position for one set of instance keys.
-struct Place {
-   std::map<int, std::unique_ptr<Place>> fixed;  // by child position
+// What was found at one position for one set of instance keys.  A place is
+// made for each instance and each fixed name below one, so it is kept small:
+// what only an object of instances has lives apart.
+struct Place;
+struct LevelPlace {
    std::vector<std::pair<Key, std::unique_ptr<Place>>> instances;  // in order of appearance
-   std::map<std::string, size_t> instanceIndex;                     // by encoded key
+   std::unordered_map<std::string, size_t> index;                 // by encoded key
    const Entry *listing = nullptr;
    std::vector<Key> listed;
+};
+struct Place {
+   std::vector<std::pair<int, std::unique_ptr<Place>>> fixed;  // by child position; a node has few
+   std::unique_ptr<LevelPlace> level;
    const Entry *get = nullptr, *data = nullptr, *set = nullptr;
+
+   Place *Fixed(int pos) const {
+      for (const auto &[p, child] : fixed)
+         if (p == pos) return child.get();
+      return nullptr;
+   }
+   LevelPlace &Level() {
+      if (!level) level = std::make_unique<LevelPlace>();
+      return *level;
+   }
 };
 
 // The simulator's rules text as JSON, when the JSON builds it back exactly.
@@ -251,8 +267,8 @@ bool Dumper::PlaceListing(const Entry &e, const Lookup &l) {
    int levelObject = tree_.at(pos).parent;
    if (!Representable(levelObject, l.keys)) return false;
    Place *place = Reach(levelObject, l.keys, true);
-   place->listing = &e;
-   place->listed = std::move(listed);
+   place->Level().listing = &e;
+   place->Level().listed = std::move(listed);
    return true;
 }
 
@@ -314,22 +330,24 @@ Place *Dumper::Reach(int pos, const std::vector<Key> &keys, bool create) {
    size_t k = 0;
    for (int c : tree_.Chain(pos)) {
       if (tree_.at(c).levelKind < 0) {
-         auto it = place->fixed.find(c);
-         if (it == place->fixed.end()) {
+         Place *child = place->Fixed(c);
+         if (child == nullptr) {
             if (!create) return nullptr;
-            it = place->fixed.emplace(c, std::make_unique<Place>()).first;
+            child = place->fixed.emplace_back(c, std::make_unique<Place>()).second.get();
          }
-         place = it->second.get();
+         place = child;
          continue;
       }
+      if (!create && !place->level) return nullptr;
+      LevelPlace &level = place->Level();
       const Key &key = keys[k++];
-      auto it = place->instanceIndex.find(Encoded(key));
-      if (it == place->instanceIndex.end()) {
+      auto it = level.index.find(Encoded(key));
+      if (it == level.index.end()) {
          if (!create) return nullptr;
-         it = place->instanceIndex.emplace(Encoded(key), place->instances.size()).first;
-         place->instances.emplace_back(key, std::make_unique<Place>());
+         it = level.index.emplace(Encoded(key), level.instances.size()).first;
+         level.instances.emplace_back(key, std::make_unique<Place>());
       }
-      place = place->instances[it->second].second.get();
+      place = level.instances[it->second].second.get();
    }
    return place;
 }
@@ -361,28 +379,30 @@ void Dumper::Emit(int pos, const Place *place, bool unlisted, std::string &out, 
    int level = tree_.LevelChild(pos);
    if (level < 0) {
       for (int c : at.children)
-         if (auto it = place->fixed.find(c); it != place->fixed.end()) {
+         if (const Place *child = place->Fixed(c)) {
             object.Member(tree_.at(c).name);
-            Emit(c, it->second.get(), false, out, depth + 1);
+            Emit(c, child, false, out, depth + 1);
          }
       return object.End();
    }
    int kind = tree_.at(level).levelKind;
-   if (place->listing != nullptr && place->listing->status != KEL_STATUS_OK)
-      object.Member("$listStatus", FormatStatus(place->listing->status));
-   if (place->listing == nullptr && tree_.at(level).node != nullptr) object.Member("$noListing", true);
+   static const LevelPlace kNoInstances;
+   const LevelPlace &lv = place->level ? *place->level : kNoInstances;
+   if (lv.listing != nullptr && lv.listing->status != KEL_STATUS_OK)
+      object.Member("$listStatus", FormatStatus(lv.listing->status));
+   if (lv.listing == nullptr && tree_.at(level).node != nullptr) object.Member("$noListing", true);
    std::unordered_set<std::string> done;
-   for (const Key &k : place->listed) {
-      auto it = place->instanceIndex.find(Encoded(k));
-      const Place *child = it == place->instanceIndex.end() ? nullptr : place->instances[it->second].second.get();
+   for (const Key &k : lv.listed) {
+      auto it = lv.index.find(Encoded(k));
+      const Place *child = it == lv.index.end() ? nullptr : lv.instances[it->second].second.get();
       object.Member(*KeyName(k, kind));
       Emit(level, child, false, out, depth + 1);
       done.insert(Encoded(k));
    }
-   for (const auto &[k, child] : place->instances)
+   for (const auto &[k, child] : lv.instances)
       if (!done.contains(Encoded(k))) {
          object.Member(*KeyName(k, kind));
-         Emit(level, child.get(), place->listing != nullptr, out, depth + 1);
+         Emit(level, child.get(), lv.listing != nullptr, out, depth + 1);
       }
    object.End();
 }
