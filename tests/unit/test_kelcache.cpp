@@ -125,6 +125,25 @@ constexpr char kSmall[] = R"({
 
 TEST(Kelcache, RoundTripIsByteIdentical) { ExpectRoundTrip(kSmall); }
 
+// Levels of many instances: the listing keeps the order given (here
+// descending), the dump writes it back in that order, and a key given twice
+// far apart is still found.
+TEST(Kelcache, LargeLevelsKeepTheirOrder) {
+   constexpr uint64_t kWorlds = 3000;
+   std::string json = R"({"tree": {"world": {)";
+   for (uint64_t id = kWorlds; id > 0; id--)
+      json += (id == kWorlds ? "" : ", ") + ("\"" + std::to_string(id) + "\": {\"name\": \"w" + std::to_string(id) + "\"}");
+   Built b(json + "}}}");
+   std::vector<Key> listed = b.Listing(KEL_NODE_world);
+   ASSERT_EQ(listed.size(), kWorlds);
+   for (uint64_t i = 0; i < kWorlds; i++) EXPECT_EQ(listed[i].value, kWorlds - i);
+   std::string dumped = MustDump(b.bytes());
+   EXPECT_LT(dumped.find("\"3000\": {"), dumped.find("\"1\": {"));
+   ExpectRoundTrip(json + "}}}");
+   EXPECT_EQ(BuildError(json + R"(, "0xbb8": {}}}})"), "/tree/world/0xbb8: the same instance key as an earlier member");
+   EXPECT_EQ(BuildError(json + R"(, "1500": {}}}})"), "/tree/world/1500: member given twice");
+}
+
 TEST(Kelcache, ExampleHostBuildsAndRoundTrips) {
    std::ifstream in(std::string(ORXKEL_SOURCE_DIR) + "/examples/host.json");
    std::stringstream json;
@@ -309,6 +328,10 @@ TEST(Kelcache, ErrorsNameTheirJsonPath) {
       {R"({"tree": {"world": {"1": {"info": {"worldId": true}}}}})", "/tree/world/1/info/worldId: expected an integer"},
       {R"({"tree": {"world": {"1": {}, "0x1": {}}}})", "/tree/world/0x1: the same instance key"},
       {R"({"tree": {"world": {"1": {}, "1": {}}}})", "/tree/world/1: member given twice"},
+      {R"({"tree": {"world": {"1": {}, "2": {}, "3": {}, "4": {}, "5": {}, "6": {}, "7": {}, "8": {}, "9": {}, "10": {}, "3": {}}}})",
+       "/tree/world/3: member given twice"},
+      {R"({"rawEntries": [{"key": "4c0100"}, {"key": "4c0100", "data": "00", "key": "4c0200"}]})",
+       "/rawEntries/1/key: member given twice"},
       {R"({"tree": {"world": {"$bogus": {}}}})", "/tree/world/$bogus: unknown control member"},
       {R"({"tree": {"sched": {"Vcpus": {"$listStatus": 1}}}})", "/tree/sched/Vcpus/$listStatus: the instances here are not listed"},
       {R"({"tree": {"world": {"$listStatus": "soon"}}})", "/tree/world/$listStatus: \"soon\" is not a status"},
@@ -333,6 +356,13 @@ TEST(Kelcache, ErrorsNameTheirJsonPath) {
       {R"({"colour": 1})", "/colour: unknown member"},
       {R"({"tree": {"world": )", "malformed JSON: parse error at line 1"},
       {R"([1])", "/: expected an object"},
+      // A syntax error or a member given twice anywhere comes before a mistake of the content.
+      {R"({"colour": 1, "tree": {"world": {"1": {"foo": 1}}})", "malformed JSON: parse error at line 1"},
+      {R"({"tree": {"world": {"1": {"foo": 1}, "2": {}, "2": {}}}})", "/tree/world/2: member given twice"},
+      {R"({"tree": {"world": {"1": {"foo": 1}}}, "tree": 1})", "/tree: member given twice"},
+      {R"({"tree": {"world": {"1": {"foo": 1}, "2": {"info": {"worldId": 1, "worldId": 2}}}}})",
+       "/tree/world/2/info/worldId: member given twice"},
+      {R"({"tree": {"world": {"1": {"foo": 1}, "2": {"info": {"foo": 1}}}}})", "/tree/world/1/foo: no such node"},
    };
    for (const auto &c : kCases) {
       std::string error = BuildError(c.json);

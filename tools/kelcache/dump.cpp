@@ -4,8 +4,8 @@
 // "tree"; that tree is then written out, listed instances in listing order.
 // An entry that the tree cannot give back byte for byte goes to "rawEntries".
 #include <algorithm>
-#include <map>
 #include <memory>
+#include <unordered_map>
 #include <unordered_set>
 
 #include "content.h"
@@ -53,14 +53,30 @@ std::string Encoded(const Key &key) {
    return out;
 }
 
-// What was found at one position for one set of instance keys.
-struct Place {
-   std::map<int, std::unique_ptr<Place>> fixed;  // by child position
+// What was found at one position for one set of instance keys.  A place is
+// made for each instance and each fixed name below one, so it is kept small:
+// what only an object of instances has lives apart.
+struct Place;
+struct LevelPlace {
    std::vector<std::pair<Key, std::unique_ptr<Place>>> instances;  // in order of appearance
-   std::map<std::string, size_t> instanceIndex;                     // by encoded key
+   std::unordered_map<std::string, size_t> index;                 // by encoded key
    const Entry *listing = nullptr;
    std::vector<Key> listed;
+};
+struct Place {
+   std::vector<std::pair<int, std::unique_ptr<Place>>> fixed;  // by child position; a node has few
+   std::unique_ptr<LevelPlace> level;
    const Entry *get = nullptr, *data = nullptr, *set = nullptr;
+
+   Place *Fixed(int pos) const {
+      for (const auto &[p, child] : fixed)
+         if (p == pos) return child.get();
+      return nullptr;
+   }
+   LevelPlace &Level() {
+      if (!level) level = std::make_unique<LevelPlace>();
+      return *level;
+   }
 };
 
 // The simulator's rules text as JSON, when the JSON builds it back exactly.
@@ -100,10 +116,56 @@ Json MarkUnlisted(const Json &value) {
    return out;
 }
 
+// Appends value as dump(2) prints it, nested depth levels deep: its lines
+// after the first take the indentation of that depth (a string in JSON
+// holds no raw line feed, so each line feed starts a line).
+void AppendJson(std::string &out, const Json &value, int depth) {
+   std::string text = value.dump(2);
+   for (char c : text) {
+      out += c;
+      if (c == '\n') out.append(size_t(depth) * 2, ' ');
+   }
+}
+
+// An object written member by member in the layout of dump(2), so that a
+// dump of any size is never held as a document; its members are appended
+// without a search (the callers give each name once).
+class ObjectWriter {
+public:
+   ObjectWriter(std::string &out, int depth) : out_(out), depth_(depth) {}
+   // Starts a member; its value follows at depth + 1.
+   void Member(std::string_view name) {
+      out_ += any_ ? ",\n" : "{\n";
+      any_ = true;
+      out_.append(size_t(depth_ + 1) * 2, ' ');
+      out_ += Json(std::string(name)).dump();
+      out_ += ": ";
+   }
+   void Member(std::string_view name, const Json &value) {
+      Member(name);
+      AppendJson(out_, value, depth_ + 1);
+   }
+   void End() {
+      if (!any_) {
+         out_ += "{}";
+         return;
+      }
+      out_ += '\n';
+      out_.append(size_t(depth_) * 2, ' ');
+      out_ += '}';
+   }
+
+private:
+   std::string &out_;
+   int depth_;
+   bool any_ = false;
+};
+
 class Dumper {
 public:
-   // The snapshot, or nothing with *status set when the file is damaged.
-   std::optional<Json> Run(const kelplat::CacheReader &reader, KEL_Status *status);
+   // Writes the snapshot to out, or returns false with *status set when the
+   // file is damaged.
+   bool Run(const kelplat::CacheReader &reader, std::string &out, KEL_Status *status);
 
 private:
    bool PlaceListing(const Entry &e, const Lookup &l);
@@ -112,21 +174,21 @@ private:
    bool PlaceMeta(const Entry &e, const Lookup &l);
    bool Representable(int pos, const std::vector<Key> &keys) const;
    Place *Reach(int pos, const std::vector<Key> &keys, bool create);
-   Json Emit(int pos, const Place *place, bool unlisted) const;
+   void Emit(int pos, const Place *place, bool unlisted, std::string &out, int depth) const;
 
    const NodeTree &tree_ = TheNodeTree();
    Place root_;
    Json simulator_ = Json::object();
 };
 
-std::optional<Json> Dumper::Run(const kelplat::CacheReader &reader, KEL_Status *status) {
+bool Dumper::Run(const kelplat::CacheReader &reader, std::string &out, KEL_Status *status) {
    std::vector<Entry> entries(reader.EntryCount());
    std::unordered_set<std::string_view> seen;
    for (uint32_t i = 0; i < entries.size(); i++) {
       kelplat::CacheHit hit;
       if (!reader.EntryAt(i, &entries[i].key, &hit) || !seen.insert(entries[i].key).second) {
          *status = KEL_STATUS_CACHE_CORRUPT;
-         return std::nullopt;
+         return false;
       }
       entries[i].status = hit.status;
       entries[i].data = hit.data;
@@ -135,35 +197,47 @@ std::optional<Json> Dumper::Run(const kelplat::CacheReader &reader, KEL_Status *
    std::sort(entries.begin(), entries.end(), [](const Entry &a, const Entry &b) { return a.key < b.key; });
 
    // Listings first, so that reads know which instances are listed; sets
-   // last, as they join the read of the same record.
-   std::vector<std::optional<Lookup>> lookups;
-   for (const Entry &e : entries) lookups.push_back(DecodeLookup(e.key));
+   // last, as they join the read of the same record.  An entry's key is
+   // decoded in the phase of its operation only, so that the decoded keys of
+   // all entries are never held at once.
+   auto phaseOf = [](std::string_view key) {
+      switch (key.empty() ? Op(0) : Op(uint8_t(key[0]))) {
+      case Op::List:
+      case Op::Meta: return 0;
+      case Op::Get:
+      case Op::Data: return 1;
+      case Op::Set: return 2;
+      default: return -1;  // an unknown operation stays raw
+      }
+   };
    std::vector<bool> placed(entries.size());
    for (int phase = 0; phase < 3; phase++) {
       for (size_t i = 0; i < entries.size(); i++) {
-         if (!lookups[i] || placed[i]) continue;
          const Entry &e = entries[i];
-         const Lookup &l = *lookups[i];
-         switch (l.op) {
-         case Op::List: placed[i] = phase == 0 && PlaceListing(e, l); break;
-         case Op::Meta: placed[i] = phase == 0 && PlaceMeta(e, l); break;
+         if (phaseOf(e.key) != phase) continue;
+         std::optional<Lookup> l = DecodeLookup(e.key);
+         if (!l) continue;
+         switch (l->op) {
+         case Op::List: placed[i] = PlaceListing(e, *l); break;
+         case Op::Meta: placed[i] = PlaceMeta(e, *l); break;
          case Op::Get:
-         case Op::Data: placed[i] = phase == 1 && PlaceRead(e, l); break;
-         case Op::Set: placed[i] = phase == 2 && PlaceSet(e, l); break;
-         default: break;  // an unknown operation stays raw
+         case Op::Data: placed[i] = PlaceRead(e, *l); break;
+         case Op::Set: placed[i] = PlaceSet(e, *l); break;
+         default: break;
          }
       }
    }
 
-   Json doc = Json::object();
+   ObjectWriter doc(out, 0);
    std::string date = reader.BuildDate();
    if (!ValidUtf8(date))
       for (char &c : date)
          if (uint8_t(c) >= 0x80) c = '?';
-   doc["buildDate"] = date;
-   doc["signature"] = ToHex({reinterpret_cast<const char *>(reader.Signature().data()), 16});
-   if (!simulator_.empty()) doc["simulator"] = simulator_;
-   doc["tree"] = Emit(0, &root_, false);
+   doc.Member("buildDate", date);
+   doc.Member("signature", ToHex({reinterpret_cast<const char *>(reader.Signature().data()), 16}));
+   if (!simulator_.empty()) doc.Member("simulator", simulator_);
+   doc.Member("tree");
+   Emit(0, &root_, false, out, 1);
    Json raw = Json::array();
    for (size_t i = 0; i < entries.size(); i++) {
       if (placed[i]) continue;
@@ -173,8 +247,10 @@ std::optional<Json> Dumper::Run(const kelplat::CacheReader &reader, KEL_Status *
       if (!entries[i].data.empty()) r["data"] = ToHex(entries[i].data);
       raw.push_back(r);
    }
-   if (!raw.empty()) doc["rawEntries"] = raw;
-   return doc;
+   if (!raw.empty()) doc.Member("rawEntries", raw);
+   doc.End();
+   out += '\n';
+   return true;
 }
 
 bool Dumper::PlaceListing(const Entry &e, const Lookup &l) {
@@ -191,8 +267,8 @@ bool Dumper::PlaceListing(const Entry &e, const Lookup &l) {
    int levelObject = tree_.at(pos).parent;
    if (!Representable(levelObject, l.keys)) return false;
    Place *place = Reach(levelObject, l.keys, true);
-   place->listing = &e;
-   place->listed = std::move(listed);
+   place->Level().listing = &e;
+   place->Level().listed = std::move(listed);
    return true;
 }
 
@@ -258,66 +334,81 @@ Place *Dumper::Reach(int pos, const std::vector<Key> &keys, bool create) {
    size_t k = 0;
    for (int c : tree_.Chain(pos)) {
       if (tree_.at(c).levelKind < 0) {
-         auto it = place->fixed.find(c);
-         if (it == place->fixed.end()) {
+         Place *child = place->Fixed(c);
+         if (child == nullptr) {
             if (!create) return nullptr;
-            it = place->fixed.emplace(c, std::make_unique<Place>()).first;
+            child = place->fixed.emplace_back(c, std::make_unique<Place>()).second.get();
          }
-         place = it->second.get();
+         place = child;
          continue;
       }
+      if (!create && !place->level) return nullptr;
+      LevelPlace &level = place->Level();
       const Key &key = keys[k++];
-      auto it = place->instanceIndex.find(Encoded(key));
-      if (it == place->instanceIndex.end()) {
+      auto it = level.index.find(Encoded(key));
+      if (it == level.index.end()) {
          if (!create) return nullptr;
-         it = place->instanceIndex.emplace(Encoded(key), place->instances.size()).first;
-         place->instances.emplace_back(key, std::make_unique<Place>());
+         it = level.index.emplace(Encoded(key), level.instances.size()).first;
+         level.instances.emplace_back(key, std::make_unique<Place>());
       }
-      place = place->instances[it->second].second.get();
+      place = level.instances[it->second].second.get();
    }
    return place;
 }
 
-// The JSON at a position; place is null for a listed instance with nothing
-// stored below it.
-Json Dumper::Emit(int pos, const Place *place, bool unlisted) const {
+// Writes the JSON at a position, depth levels deep; place is null for a
+// listed instance with nothing stored below it.
+void Dumper::Emit(int pos, const Place *place, bool unlisted, std::string &out, int depth) const {
    const Position &at = tree_.at(pos);
    if (at.node != nullptr && (at.node->flags & kelplat::KEL_NF_DATA)) {
-      if (place == nullptr || place->data == nullptr) return nullptr;
-      Json j = DumpData(place->data->status, place->data->data, unlisted).value_or(nullptr);
-      return unlisted ? MarkUnlisted(j) : j;
+      Json j = nullptr;
+      if (place != nullptr && place->data != nullptr)
+         j = DumpData(place->data->status, place->data->data, unlisted).value_or(nullptr);
+      AppendJson(out, unlisted ? MarkUnlisted(j) : j, depth);
+      return;
    }
    if (at.node != nullptr && at.node->recordSize > 0) {
-      if (place == nullptr || place->get == nullptr) return nullptr;
-      RecordEntry r{place->get->status, std::string(place->get->data), {}};
-      if (place->set != nullptr) r.setStatus = place->set->status;
-      Json j = DumpRecord(*at.node, r, unlisted).value_or(nullptr);
-      return unlisted ? MarkUnlisted(j) : j;
+      Json j = nullptr;
+      if (place != nullptr && place->get != nullptr) {
+         RecordEntry r{place->get->status, std::string(place->get->data), {}};
+         if (place->set != nullptr) r.setStatus = place->set->status;
+         j = DumpRecord(*at.node, r, unlisted).value_or(nullptr);
+      }
+      AppendJson(out, unlisted ? MarkUnlisted(j) : j, depth);
+      return;
    }
-   Json out = Json::object();
-   if (unlisted) out["$unlisted"] = true;
-   if (place == nullptr) return out;
+   ObjectWriter object(out, depth);
+   if (unlisted) object.Member("$unlisted", true);
+   if (place == nullptr) return object.End();
    int level = tree_.LevelChild(pos);
    if (level < 0) {
       for (int c : at.children)
-         if (auto it = place->fixed.find(c); it != place->fixed.end())
-            out[std::string(tree_.at(c).name)] = Emit(c, it->second.get(), false);
-      return out;
+         if (const Place *child = place->Fixed(c)) {
+            object.Member(tree_.at(c).name);
+            Emit(c, child, false, out, depth + 1);
+         }
+      return object.End();
    }
    int kind = tree_.at(level).levelKind;
-   if (place->listing != nullptr && place->listing->status != KEL_STATUS_OK)
-      out["$listStatus"] = FormatStatus(place->listing->status);
-   if (place->listing == nullptr && tree_.at(level).node != nullptr) out["$noListing"] = true;
+   static const LevelPlace kNoInstances;
+   const LevelPlace &lv = place->level ? *place->level : kNoInstances;
+   if (lv.listing != nullptr && lv.listing->status != KEL_STATUS_OK)
+      object.Member("$listStatus", FormatStatus(lv.listing->status));
+   if (lv.listing == nullptr && tree_.at(level).node != nullptr) object.Member("$noListing", true);
    std::unordered_set<std::string> done;
-   for (const Key &k : place->listed) {
-      auto it = place->instanceIndex.find(Encoded(k));
-      const Place *child = it == place->instanceIndex.end() ? nullptr : place->instances[it->second].second.get();
-      out[*KeyName(k, kind)] = Emit(level, child, false);
+   for (const Key &k : lv.listed) {
+      auto it = lv.index.find(Encoded(k));
+      const Place *child = it == lv.index.end() ? nullptr : lv.instances[it->second].second.get();
+      object.Member(*KeyName(k, kind));
+      Emit(level, child, false, out, depth + 1);
       done.insert(Encoded(k));
    }
-   for (const auto &[k, child] : place->instances)
-      if (!done.contains(Encoded(k))) out[*KeyName(k, kind)] = Emit(level, child.get(), place->listing != nullptr);
-   return out;
+   for (const auto &[k, child] : lv.instances)
+      if (!done.contains(Encoded(k))) {
+         object.Member(*KeyName(k, kind));
+         Emit(level, child.get(), lv.listing != nullptr, out, depth + 1);
+      }
+   object.End();
 }
 
 }  // namespace
@@ -333,10 +424,10 @@ bool DumpCache(std::string_view cacheBytes, std::string *jsonText, std::string *
          message = "node table: " + TheNodeTree().error;
       } else if (kelplat::CacheReader reader; (status = reader.Attach(cacheBytes, 0)) != KEL_STATUS_OK) {
          message = ORX_ReturnStatusToString(status);
-      } else if (std::optional<Json> doc = Dumper().Run(reader, &status); !doc) {
+      } else if (std::string text; !Dumper().Run(reader, text, &status)) {
          message = ORX_ReturnStatusToString(status);
       } else {
-         if (jsonText != nullptr) *jsonText = doc->dump(2) + "\n";
+         if (jsonText != nullptr) *jsonText = std::move(text);
          return true;
       }
    } catch (const Json::exception &e) {
