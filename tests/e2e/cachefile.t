@@ -104,3 +104,38 @@ timeout: 5
 exit: 1
 --- stderr
 kelcache: @TMP/big.cache: Corrupt cache file
+=== case a cache through a pipe on standard input is read whole
+snapshot: tiny
+exe: /bin/sh
+argv: sh -c 'cat @CACHE | @BIN/orxkeltools -c /dev/stdin halvex -v'
+exit: 0
+--- stdout
+Orvik 9.1.0 build-00042
+=== case a cache through a process substitution is read whole
+snapshot: tiny
+exe: /bin/bash
+argv: bash -c '@BIN/orxkeltools -c <(gzip -c @CACHE | gzip -dc) halvex -v'
+exit: 0
+--- stdout
+Orvik 9.1.0 build-00042
+=== case a pipe that ends inside the cache is a truncated file
+snapshot: tiny
+exe: /bin/sh
+argv: sh -c 'head -c 200 @CACHE | @BIN/orxkeltools -c /dev/stdin halvex -v'
+exit: 1
+--- stderr
+Couldn't use specifed cache file /dev/stdin: Truncated cache file
+=== case a FIFO nobody writes to says so
+mode: plain
+setup: mkfifo fifo
+run: -c @TMP/fifo halvex -v
+timeout: 10
+exit: 1
+--- stderr
+Couldn't use specifed cache file @TMP/fifo: Nothing was written to the pipe
+=== case a character device is refused with its own status
+mode: plain
+run: -c /dev/null halvex -v
+exit: 1
+--- stderr
+Couldn't use specifed cache file /dev/null: Not a regular file or a pipe
