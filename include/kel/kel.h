@@ -101,7 +101,9 @@ int HostType_OSIsORX(void);
 int HostType_OSIsSimulator(void);
 int OrxSyscall_Init(int channel, int flags, int reserved);
 
-/* Read from a cache file from now on.  Flags: 0, or KEL_CACHE_NO_CHECKSUM. */
+/* Read from a cache file (or a pipe, read whole) from now on.  Opening checks
+ * the header and the tables' bounds only, so flags are 0; KEL_CACHE_NO_CHECKSUM
+ * is accepted and changes nothing (`kelcache verify` checks the checksum). */
 enum { KEL_CACHE_NO_CHECKSUM = 1 };
 KEL_Status KEL_UseCache(const char *path, int flags);
 

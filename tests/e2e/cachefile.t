@@ -139,3 +139,33 @@ run: -c /dev/null halvex -v
 exit: 1
 --- stderr
 Couldn't use specifed cache file /dev/null: Not a regular file or a pipe
+=== case kelcache info shows what a cache holds and for which build
+snapshot: tiny
+exe: kelcache
+value: SIG @BIN/kelcache --tool-signature
+argv: kelcache info @CACHE
+exit: 0
+--- stdout
+file:        @CACHE
+signature:   @SIG (matches this build)
+build date:  Nov 30 2026
+size:        440 bytes
+entries:     1
+node                                      listings     reads      sets      data
+system_version                                   0         1         0         0
+=== case kelcache verify passes a built cache
+snapshot: tiny
+exe: kelcache
+argv: kelcache verify @CACHE
+exit: 0
+--- stdout
+@CACHE: OK, 1 entries, 440 bytes
+=== case kelcache --version names the version, the tree signature and the build date
+exe: kelcache
+value: SIG @BIN/kelcache --tool-signature
+argv: kelcache --version
+exit: 0
+--- stdout
+kelcache 1.0.0
+tree signature: @SIG
+build date: @BUILD_DATE
