@@ -44,6 +44,8 @@ MAP_KINDS = ["/usr/lib/libc.so", "/usr/lib/libproc-%d.so", "[heap]", "[stack]", 
 
 def snapshot(n_worlds, seed=1):
     doc = ps_scale.snapshot(n_worlds, seed)
+    doc["tree"]["system"] = {"version": {"product": "Orvik", "version": "9.1.0", "releaseLevel": "Release",
+                                         "update": "0", "build": 42}}
     rnd = random.Random(seed + 1)
     for cid, cartel in doc["tree"]["userworld"]["cartel"].items():
         c = int(cid)

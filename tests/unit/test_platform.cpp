@@ -481,3 +481,32 @@ TEST(CacheReader, PipesAreReadWhole) {
    StoreU64(reinterpret_cast<uint8_t *>(huge.data()) + 64, uint64_t(1) << 32);
    EXPECT_EQ(throughPipe(huge), KEL_STATUS_CACHE_CORRUPT);
 }
+
+// Texts of a list live in chunks that never move: a text read early stays
+// valid while thousands more are appended, and removing the last entries
+// gives their room back for the next ones.
+TEST(ParamListTexts, StayInPlaceAcrossGrowth) {
+   List l(KEL_ParamListCreate(1, 1));
+   ASSERT_EQ(KEL_ParamListAddString(l.get(), "first"), KEL_STATUS_OK);
+   const char *first = KEL_ParamGetString(KEL_ParamListGetParam(l.get(), 0));
+   std::string big(5000, 'b');  // larger than a chunk
+   for (int i = 0; i < 5000; i++)
+      ASSERT_EQ(KEL_ParamListAddString(l.get(), i == 2500 ? big.c_str() : std::to_string(i).c_str()), KEL_STATUS_OK);
+   EXPECT_STREQ(first, "first");
+   EXPECT_EQ(KEL_ParamGetString(KEL_ParamListGetParam(l.get(), 2501)), big);
+   EXPECT_STREQ(KEL_ParamGetString(KEL_ParamListGetParam(l.get(), 5000)), "4999");
+   for (int i = 0; i < 10; i++) KEL_ParamListRemoveLastParam(l.get());
+   ASSERT_EQ(KEL_ParamListAddString(l.get(), "again"), KEL_STATUS_OK);
+   EXPECT_STREQ(KEL_ParamGetString(KEL_ParamListGetParam(l.get(), 4991)), "again");
+   EXPECT_STREQ(KEL_ParamGetString(KEL_ParamListGetParam(l.get(), 4990)), "4989");
+   EXPECT_STREQ(first, "first");
+   // A walk's key list: the same text key added and removed over and over
+   // takes no more room.
+   List keys(KEL_ParamListCreate(1, 1));
+   KEL_ParamListAddInt(keys.get(), 1);
+   for (int i = 0; i < 100000; i++) {
+      ASSERT_EQ(KEL_ParamListAddString(keys.get(), "boot.cfg"), KEL_STATUS_OK);
+      KEL_ParamListRemoveLastParam(keys.get());
+   }
+   EXPECT_LE(keys->chunks.size(), 1u);
+}
