@@ -171,17 +171,24 @@ std::string CacheWriter::Finish(std::span<const uint8_t, 16> signature,
              [](const Entry *a, const Entry *b) { return KeyLess(a->key, b->key); });
 
    const uint64_t slots = SlotCountFor(sorted.size());
+   // Slots first (in key order, so that the table is the same for the same
+   // entries), then each entry's bytes in slot order.
+   std::vector<const Entry *> slotted(slots, nullptr);
    size_t total = kHeaderSize + slots * kSlotSize;
-   for (const Entry *e : sorted) total += e->key.size() + e->data.size();
+   for (const Entry *e : sorted) {
+      uint64_t i = HomeHash(e->key) & (slots - 1);
+      while (slotted[i] != nullptr) i = (i + 1) & (slots - 1);
+      slotted[i] = e;
+      total += e->key.size() + e->data.size();
+   }
    std::string out(total, '\0');
    auto *head = reinterpret_cast<uint8_t *>(out.data());
    size_t at = kHeaderSize + slots * kSlotSize;
-   for (const Entry *e : sorted) {
-      uint64_t h = KeyHash(e->key);
-      uint64_t i = h & (slots - 1);
-      while (LoadU32(head + kHeaderSize + i * kSlotSize + 8) != 0) i = (i + 1) & (slots - 1);
+   for (uint64_t i = 0; i < slots; i++) {
+      const Entry *e = slotted[i];
+      if (e == nullptr) continue;
       uint8_t *slot = head + kHeaderSize + i * kSlotSize;
-      StoreU32(slot, uint32_t(h >> 32));
+      StoreU32(slot, uint32_t(KeyHash(e->key) >> 32));
       StoreU32(slot + 4, uint32_t(at));
       StoreU32(slot + 8, uint32_t(e->key.size()));
       StoreU32(slot + 12, e->status);
@@ -447,19 +454,15 @@ bool CacheReader::SlotAt(uint32_t i, std::string_view *key, CacheHit *hit, uint3
 
 bool CacheReader::EntryAt(uint32_t i, std::string_view *key, CacheHit *hit) const {
    if (!ordered_) {
-      // The occupied slots, in the order of their keys in the file, which
-      // the writer lays out in key order.
+      // The occupied slots, in the order of their keys.
       order_.clear();
+      std::vector<std::string_view> keys(slots_);
       for (uint32_t s = 0; s < slots_; s++) {
-         std::string_view k;
          CacheHit h;
          uint32_t tag;
-         if (SlotAt(s, &k, &h, &tag)) order_.push_back(s);
+         if (SlotAt(s, &keys[s], &h, &tag)) order_.push_back(s);
       }
-      const auto *base = reinterpret_cast<const uint8_t *>(bytes_.data()) + kHeaderSize;
-      std::sort(order_.begin(), order_.end(), [base](uint32_t a, uint32_t b) {
-         return LoadU32(base + size_t(a) * kSlotSize + 4) < LoadU32(base + size_t(b) * kSlotSize + 4);
-      });
+      std::sort(order_.begin(), order_.end(), [&keys](uint32_t a, uint32_t b) { return KeyLess(keys[a], keys[b]); });
       ordered_ = true;
    }
    uint32_t tag;
@@ -468,10 +471,9 @@ bool CacheReader::EntryAt(uint32_t i, std::string_view *key, CacheHit *hit) cons
 
 KEL_Status CacheReader::Lookup(std::string_view key, CacheHit *hit) const {
    if (slots_ == 0) return KEL_STATUS_NOT_FOUND;
-   const uint64_t h = KeyHash(key);
-   const uint32_t tag = uint32_t(h >> 32), mask = slots_ - 1;
+   const uint32_t tag = uint32_t(KeyHash(key) >> 32), mask = slots_ - 1;
    const auto *base = reinterpret_cast<const uint8_t *>(bytes_.data()) + kHeaderSize;
-   uint32_t i = uint32_t(h) & mask;
+   uint32_t i = uint32_t(HomeHash(key)) & mask;
    for (uint32_t probes = 0; probes < slots_; probes++, i = (i + 1) & mask) {
       const uint8_t *s = base + size_t(i) * kSlotSize;
       uint32_t keyLen = LoadU32(s + 8);

@@ -16,15 +16,17 @@
 //  88   4  reserved (0)
 //  92   4  check of bytes 56 .. 92, the fields that place everything else
 //  96      slot table: S slots of 24 bytes, a hash table with linear probing:
-//            0 hash tag (high 32 bits of the key's 64-bit hash),
+//            0 hash tag (high 32 bits of the whole key's 64-bit hash),
 //            4 key offset, 8 key length (0: an empty slot), 12 status,
 //            16 data offset, 20 data length
-//          then, per entry in key order (memcmp order, a shorter key first on
-//          a common prefix), its key bytes directly followed by its data
-//          bytes, so that a lookup touches the slot and one place in the file.
+//          then, per entry in slot order, its key bytes directly followed by
+//          its data bytes, so that a lookup touches the slot and one place in
+//          the file.
 //
-// A lookup starts at slot (hash & (S - 1)) and walks on to the first empty
-// slot.  Opening checks the header and that the slot table and key area lie
+// A lookup starts at slot (home hash & (S - 1)), the home hash being that of
+// the instance keys alone, and walks on to the first empty slot: the
+// entries of one instance share a first slot and so lie side by side, in
+// the slot table and in the file.  Opening checks the header and that the slot table and key area lie
 // within the file (no pass over the data); every offset and length a slot
 // holds is checked when the slot is used.  A full verification (checksum,
 // every slot in bounds, every key found where its hash leads) is kept for
@@ -47,6 +49,7 @@
 #define PLATFORM_CACHEFILE_H
 
 #include <cstdint>
+#include <algorithm>
 #include <cstring>
 #include <optional>
 #include <span>
@@ -107,9 +110,17 @@ bool DecodeList(std::string_view bytes, std::vector<Key> *keys);
 std::string EncodeList(std::span<const Key> keys);
 
 uint64_t Checksum(const uint8_t *p, size_t n);
-// The hash a lookup key is filed under.
+// The hash of a whole lookup key: its high 32 bits are a slot's tag.
 inline uint64_t KeyHash(std::string_view key) {
    return Checksum(reinterpret_cast<const uint8_t *>(key.data()), key.size());
+}
+// The hash that picks a key's first slot: that of its instance keys alone
+// (after the operation and node), so that every read and listing of one
+// instance (a world's name, record and statistics, the cartel of the same
+// number) lies in neighbouring slots, and their bytes side by side.
+inline uint64_t HomeHash(std::string_view key) {
+   size_t skip = std::min<size_t>(key.size(), 3);
+   return Checksum(reinterpret_cast<const uint8_t *>(key.data()) + skip, key.size() - skip);
 }
 // The check stored at kHeaderCheckOffset of a header.
 uint32_t HeaderCheck(const uint8_t *header);
