@@ -151,11 +151,11 @@ def main():
             json_mb = os.path.getsize(jsons[n]) / 1e6
             cpu, _, rss = run([kelcache, "build", jsons[n], "-o", os.path.join(tmp, "again.cache")])
             row("kelcache build, %dk worlds" % (n // 1000), cpu, 3.0, "goal 3 s", unit="s ", goal=1)
-            row("  peak memory (MB)", rss / 1024 / 1000, json_mb * 3 / 1000, "3x the JSON (%.0f MB)" % json_mb,
+            row("  peak memory", rss / 1024, json_mb * 3, "3x the JSON (%.0f MB)" % json_mb,
                 unit="MB", goal=1)
             cpu, _, rss = run([kelcache, "dump", caches[n]])
             row("kelcache dump, %dk worlds" % (n // 1000), cpu, 3.0, "goal 3 s", unit="s ", goal=1)
-            row("  peak memory (MB)", rss / 1024 / 1000, json_mb * 3 / 1000, "3x the JSON (%.0f MB)" % json_mb,
+            row("  peak memory", rss / 1024, json_mb * 3, "3x the JSON (%.0f MB)" % json_mb,
                 unit="MB", goal=1)
         if args.million:
             b10, b100 = builds[100000][0], builds[1000000][0]
