@@ -204,7 +204,7 @@ std::string CacheWriter::Finish(std::span<const uint8_t, 16> signature,
    StoreU32(head + 12, 0);
    std::memcpy(head + 16, signature.data(), 16);
    std::string_view date = buildDate.substr(0, kBuildDateMax);
-   std::memcpy(head + 32, date.data(), date.size());
+   if (!date.empty()) std::memcpy(head + 32, date.data(), date.size());
    StoreU32(head + 56, uint32_t(sorted.size()));
    StoreU32(head + 60, uint32_t(kHeaderSize));
    StoreU64(head + 64, out.size());

@@ -246,7 +246,7 @@ int KEL_CheckSig(char *buf, size_t len, const char **mine) {
    if (t.loaded) {
       std::string_view raw = t.reader.Bytes().substr(32, kBuildDateMax);
       raw = raw.substr(0, std::min(raw.find('\0'), raw.size()));
-      std::memcpy(stored, raw.data(), raw.size());
+      if (!raw.empty()) std::memcpy(stored, raw.data(), raw.size());
       date = {stored, raw.size()};
       mismatch = !std::equal(ToolSignature().begin(), ToolSignature().end(), t.reader.Signature().begin());
    } else if (t.backend == Backend::Simulator) {
@@ -256,7 +256,7 @@ int KEL_CheckSig(char *buf, size_t len, const char **mine) {
    }
    if (buf != nullptr && len > 0) {
       size_t n = std::min(date.size(), len - 1);
-      std::memcpy(buf, date.data(), n);
+      if (n > 0) std::memcpy(buf, date.data(), n);
       buf[n] = '\0';
    }
    return mismatch;
