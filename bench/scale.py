@@ -66,7 +66,18 @@ def snapshot(n_worlds, seed=1):
 
 
 def run(argv, env=None, cwd=None):
-    """CPU seconds, wall seconds and peak memory (KiB) of one run; output thrown away."""
+    """CPU seconds, wall seconds and peak memory (KiB) of one run; output thrown away.
+
+    The peak memory is measured by GNU time where it is installed: a child
+    forked from this (large) Python process would report the parent's size
+    as its own peak, since the peak survives exec.
+    """
+    gnu_time = "/usr/bin/time"
+    rss_file = None
+    if os.access(gnu_time, os.X_OK):
+        fd, rss_file = tempfile.mkstemp(prefix="orxkel-rss-")
+        os.close(fd)
+        argv = [gnu_time, "-f", "%M", "-o", rss_file] + list(argv)
     start = time.perf_counter()
     p = subprocess.Popen(argv, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL, env=env, cwd=cwd)
     _, status, usage = os.wait4(p.pid, 0)
@@ -74,7 +85,12 @@ def run(argv, env=None, cwd=None):
     p.returncode = os.waitstatus_to_exitcode(status)
     if p.returncode != 0:
         raise SystemExit("failed (%d): %s" % (p.returncode, " ".join(argv)))
-    return usage.ru_utime + usage.ru_stime, wall, usage.ru_maxrss
+    rss = usage.ru_maxrss
+    if rss_file is not None:
+        with open(rss_file) as f:
+            rss = int(f.read().split()[-1])
+        os.unlink(rss_file)
+    return usage.ru_utime + usage.ru_stime, wall, rss
 
 
 def side_by_side(ours, theirs, runs):
