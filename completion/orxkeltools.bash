@@ -2,7 +2,7 @@
 #
 #   orxkeltools [-c|--cache FILE] COMMAND [ARGUMENTS]
 #   COMMAND [ARGUMENTS]                 (a link named after the command)
-#   kelcache build SNAPSHOT.json -o FILE | dump FILE | --tool-build-date | ...
+#   kelcache build SNAPSHOT.json -o FILE | dump FILE | verify FILE | info FILE | --tool-build-date | ...
 #
 # Several command names are also names of Linux tools (ps, lspci, pkill, ...).
 # The function is registered for them too, but completes them only when the
@@ -139,7 +139,7 @@ _kelcache() {
     COMPREPLY=()
 
     if ((cword == 1)); then
-        mapfile -t COMPREPLY < <(compgen -W "build dump --tool-build-date --tool-signature --help" -- "$cur")
+        mapfile -t COMPREPLY < <(compgen -W "build dump verify info --version --tool-build-date --tool-signature --help" -- "$cur")
         return 0
     fi
     case ${COMP_WORDS[1]} in
@@ -151,7 +151,7 @@ _kelcache() {
         else
             _orxkeltools_files "$cur" .json
         fi ;;
-    dump)
+    dump | verify | info)
         ((cword == 2)) && _orxkeltools_files "$cur" .cache ;;
     esac
     return 0

@@ -11,8 +11,22 @@ using namespace kelplat;
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t *data, size_t size) {
    std::string_view bytes(reinterpret_cast<const char *>(data), size);
+   // Opened as the tool opens a cache (header and table bounds only), every
+   // lookup of every stored key stays within the bytes.
+   CacheReader quick;
+   if (quick.Attach(bytes, kCacheQuickOpen) == KEL_STATUS_OK) {
+      for (uint32_t i = 0; i < quick.SlotCount() && i < 4096; i++) {
+         std::string_view key;
+         CacheHit hit;
+         uint32_t tag;
+         if (!quick.SlotAt(i, &key, &hit, &tag)) continue;
+         CacheHit again;
+         quick.Lookup(key, &again);
+      }
+      quick.Verify(KEL_CACHE_NO_CHECKSUM);
+   }
    CacheReader reader;
-   // The checksum would turn away nearly every input before the index is read.
+   // The checksum would turn away nearly every input before the slots are read.
    if (reader.Attach(bytes, KEL_CACHE_NO_CHECKSUM) != KEL_STATUS_OK) return 0;
    reader.BuildDate();
    std::vector<Key> keys;

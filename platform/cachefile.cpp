@@ -1,12 +1,15 @@
 // Cache file encoding, writing and checked reading.
 #include "cachefile.h"
 
+#include <errno.h>
 #include <fcntl.h>
+#include <poll.h>
 #include <sys/mman.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
 #include <algorithm>
+#include <cstdlib>
 
 #include "internal.h"
 
@@ -48,21 +51,30 @@ std::string EncodeLookup(Op op, KEL_Node node, std::span<const Key> keys) {
    return out;
 }
 
-std::optional<std::string> EncodeParamLookup(Op op, KEL_Node node, const KEL_ParamList *keys) {
-   std::string out = LookupPrefix(op, node);
-   if (keys == nullptr) return out;
+bool AppendParamLookup(std::string &out, Op op, KEL_Node node, const KEL_ParamList *keys) {
+   out.clear();
+   out.push_back(char(op));
+   out.push_back(char(node & 0xff));
+   out.push_back(char(node >> 8));
+   if (keys == nullptr) return true;
    for (const KEL_Param &p : keys->entries) {
-      if (p.kind > 0xff) return std::nullopt;
-      Key k;
-      k.kind = p.kind;
+      if (p.kind > 0xff) return false;
+      out.push_back(char(uint8_t(p.kind)));
       if (p.kind == KEL_PARAM_STRING) {
-         if (p.text == nullptr) return std::nullopt;
-         k.text = p.text;
+         if (p.text == nullptr) return false;
+         size_t n = std::strlen(p.text);
+         AppendU32(out, uint32_t(n));
+         out.append(p.text, n);
       } else {
-         k.value = p.value;
+         AppendU64(out, p.value);
       }
-      AppendKey(out, k);
    }
+   return true;
+}
+
+std::optional<std::string> EncodeParamLookup(Op op, KEL_Node node, const KEL_ParamList *keys) {
+   std::string out;
+   if (!AppendParamLookup(out, op, node, keys)) return std::nullopt;
    return out;
 }
 
@@ -126,10 +138,22 @@ uint64_t Checksum(const uint8_t *p, size_t n) {
    return h * 0xc4ceb9fe1a85ec53ULL;
 }
 
+uint32_t HeaderCheck(const uint8_t *header) {
+   return uint32_t(Checksum(header + kHeaderCheckStart, kHeaderCheckOffset - kHeaderCheckStart));
+}
+
 static bool KeyLess(std::string_view a, std::string_view b) {
    size_t n = std::min(a.size(), b.size());
    int c = n ? std::memcmp(a.data(), b.data(), n) : 0;
    return c < 0 || (c == 0 && a.size() < b.size());
+}
+
+// The slot count for n entries: a power of two with at least a third of
+// the slots empty, so that probes stay short and always end.
+static uint64_t SlotCountFor(size_t n) {
+   uint64_t s = 2;
+   while (s < uint64_t(n) + uint64_t(n) / 2 + 1) s *= 2;
+   return s;
 }
 
 bool CacheWriter::Add(std::string lookup, uint32_t status, std::string data) {
@@ -141,40 +165,54 @@ bool CacheWriter::Add(std::string lookup, uint32_t status, std::string data) {
 std::string CacheWriter::Finish(std::span<const uint8_t, 16> signature,
                                 std::string_view buildDate) const {
    std::vector<const Entry *> sorted;
+   sorted.reserve(entries_.size());
    for (const Entry &e : entries_) sorted.push_back(&e);
    std::sort(sorted.begin(), sorted.end(),
              [](const Entry *a, const Entry *b) { return KeyLess(a->key, b->key); });
 
-   std::string out(kHeaderSize + sorted.size() * kIndexEntrySize, '\0');
+   const uint64_t slots = SlotCountFor(sorted.size());
+   // Slots first (in key order, so that the table is the same for the same
+   // entries), then each entry's bytes in slot order.
+   std::vector<const Entry *> slotted(slots, nullptr);
+   size_t total = kHeaderSize + slots * kSlotSize;
+   for (const Entry *e : sorted) {
+      uint64_t i = HomeHash(e->key) & (slots - 1);
+      while (slotted[i] != nullptr) i = (i + 1) & (slots - 1);
+      slotted[i] = e;
+      total += e->key.size() + e->data.size();
+   }
+   std::string out(total, '\0');
    auto *head = reinterpret_cast<uint8_t *>(out.data());
-   std::vector<uint32_t> keyOff, dataOff;
-   for (const Entry *e : sorted) {
-      keyOff.push_back(uint32_t(out.size()));
-      out += e->key;
+   size_t at = kHeaderSize + slots * kSlotSize;
+   for (uint64_t i = 0; i < slots; i++) {
+      const Entry *e = slotted[i];
+      if (e == nullptr) continue;
+      uint8_t *slot = head + kHeaderSize + i * kSlotSize;
+      StoreU32(slot, uint32_t(KeyHash(e->key) >> 32));
+      StoreU32(slot + 4, uint32_t(at));
+      StoreU32(slot + 8, uint32_t(e->key.size()));
+      StoreU32(slot + 12, e->status);
+      std::memcpy(head + at, e->key.data(), e->key.size());
+      at += e->key.size();
+      StoreU32(slot + 16, uint32_t(at));
+      StoreU32(slot + 20, uint32_t(e->data.size()));
+      if (!e->data.empty()) std::memcpy(head + at, e->data.data(), e->data.size());
+      at += e->data.size();
    }
-   for (const Entry *e : sorted) {
-      dataOff.push_back(uint32_t(out.size()));
-      out += e->data;
-   }
-   head = reinterpret_cast<uint8_t *>(out.data());
    std::memcpy(head, kCacheMagic, 8);
    StoreU32(head + 8, kCacheVersion);
    StoreU32(head + 12, 0);
    std::memcpy(head + 16, signature.data(), 16);
    std::string_view date = buildDate.substr(0, kBuildDateMax);
-   std::memcpy(head + 32, date.data(), date.size());
+   if (!date.empty()) std::memcpy(head + 32, date.data(), date.size());
    StoreU32(head + 56, uint32_t(sorted.size()));
    StoreU32(head + 60, uint32_t(kHeaderSize));
    StoreU64(head + 64, out.size());
-   for (size_t i = 0; i < sorted.size(); i++) {
-      uint8_t *ix = head + kHeaderSize + i * kIndexEntrySize;
-      StoreU32(ix, keyOff[i]);
-      StoreU32(ix + 4, uint32_t(sorted[i]->key.size()));
-      StoreU32(ix + 8, sorted[i]->status);
-      StoreU32(ix + 12, dataOff[i]);
-      StoreU32(ix + 16, uint32_t(sorted[i]->data.size()));
-   }
    StoreU64(head + 72, Checksum(head + kHeaderSize, out.size() - kHeaderSize));
+   StoreU32(head + 80, uint32_t(slots));
+   StoreU32(head + 84, uint32_t(kHeaderSize + slots * kSlotSize));
+   StoreU32(head + 88, 0);
+   StoreU32(head + kHeaderCheckOffset, HeaderCheck(head));
    return out;
 }
 
@@ -182,53 +220,158 @@ CacheReader::~CacheReader() { Close(); }
 
 void CacheReader::Close() {
    if (map_ != nullptr) munmap(map_, mapSize_);
+   std::free(owned_);
+   owned_ = nullptr;
    map_ = nullptr;
    mapSize_ = 0;
    bytes_ = {};
    count_ = 0;
+   slots_ = 0;
+   order_.clear();
+   ordered_ = false;
+}
+
+// Whether bytes look like a JSON snapshot: the first byte that is not a
+// blank opens an object.
+static bool LooksLikeJson(const uint8_t *p, size_t n) {
+   size_t i = 0;
+   if (n >= 3 && p[0] == 0xef && p[1] == 0xbb && p[2] == 0xbf) i = 3;  // a UTF-8 byte order mark
+   while (i < n && (p[i] == ' ' || p[i] == '\t' || p[i] == '\n' || p[i] == '\r')) i++;
+   return i < n && p[i] == '{';
 }
 
 // The checks of the fixed header against the size of the bytes it heads
-// (at least kHeaderSize): format, version, the size the header claims and
-// where the index lies.
+// (at least kHeaderSize): format, version, the size the header claims, the
+// header check, and where the slot table and the key area lie.
 static KEL_Status CheckHeader(const uint8_t *p, uint64_t size) {
-   if (std::memcmp(p, kCacheMagic, 7) != 0) return KEL_STATUS_CACHE_FORMAT;
+   if (std::memcmp(p, kCacheMagic, 7) != 0)
+      return LooksLikeJson(p, kHeaderSize) ? KEL_STATUS_CACHE_JSON : KEL_STATUS_CACHE_FORMAT;
    if (p[7] != uint8_t(kCacheMagic[7]) || LoadU32(p + 8) != kCacheVersion) return KEL_STATUS_CACHE_VERSION;
    uint64_t total = LoadU64(p + 64);
    // Offsets are 32 bits: a larger file is damage, refused before any byte
-   // past the header is read (its checksum alone would take minutes).
+   // past the header is read.
    if (total > kMaxCacheFileSize) return KEL_STATUS_CACHE_CORRUPT;
    if (total > size) return KEL_STATUS_CACHE_TRUNCATED;
    if (total != size) return KEL_STATUS_CACHE_CORRUPT;
-   uint32_t count = LoadU32(p + 56);
-   uint32_t index = LoadU32(p + 60);
-   if (index < kHeaderSize || index > total || (total - index) / kIndexEntrySize < count)
+   if (LoadU32(p + kHeaderCheckOffset) != HeaderCheck(p)) return KEL_STATUS_CACHE_CORRUPT;
+   uint64_t count = LoadU32(p + 56), index = LoadU32(p + 60), slots = LoadU32(p + 80);
+   uint64_t keyArea = LoadU32(p + 84);
+   if (index != kHeaderSize || slots < 2 || (slots & (slots - 1)) != 0 || count >= slots ||
+       keyArea != index + slots * kSlotSize || keyArea > total)
       return KEL_STATUS_CACHE_CORRUPT;
+   return KEL_STATUS_OK;
+}
+
+// The status for a file that cannot be opened, from errno.
+static KEL_Status OpenError(int error) {
+   switch (error) {
+   case ENOENT:
+   case ENOTDIR: return KEL_STATUS_CACHE_NO_FILE;
+   case EACCES:
+   case EPERM: return KEL_STATUS_CACHE_DENIED;
+   case EISDIR: return KEL_STATUS_CACHE_FOLDER;
+   default: return KEL_STATUS_CACHE_OPEN;
+   }
+}
+
+// Reads from a non-blocking pipe: waits only while a writer holds it open.
+static ssize_t ReadSome(int fd, char *buf, size_t n) {
+   for (;;) {
+      ssize_t got = read(fd, buf, n);
+      if (got >= 0) return got;
+      if (errno == EINTR) continue;
+      if (errno != EAGAIN && errno != EWOULDBLOCK) return -1;
+      struct pollfd p = {fd, POLLIN, 0};
+      if (poll(&p, 1, -1) < 0 && errno != EINTR) return -1;
+   }
+}
+
+// A pipe is read whole: the header first, then exactly the size it claims
+// (at most what 32-bit offsets reach).  A pipe without a writer ends at
+// once: a non-blocking read then reports the end of the stream.
+KEL_Status CacheReader::ReadPipe(int fd) {
+   uint8_t header[kHeaderSize];
+   size_t have = 0;
+   while (have < kHeaderSize) {
+      ssize_t got = ReadSome(fd, reinterpret_cast<char *>(header) + have, kHeaderSize - have);
+      if (got < 0) return KEL_STATUS_CACHE_OPEN;
+      if (got == 0) break;
+      have += size_t(got);
+   }
+   if (have == 0) return KEL_STATUS_CACHE_EMPTY_PIPE;
+   if (have < kHeaderSize) {
+      if (std::memcmp(header, kCacheMagic, std::min(have, sizeof kCacheMagic)) == 0)
+         return KEL_STATUS_CACHE_TRUNCATED;
+      return LooksLikeJson(header, have) ? KEL_STATUS_CACHE_JSON : KEL_STATUS_CACHE_FORMAT;
+   }
+   uint64_t total = LoadU64(header + 64);
+   // Checked against the size it claims, so that only the size checks can
+   // fail on what the stream has not given yet.
+   KEL_Status status = CheckHeader(header, std::max<uint64_t>(total, kHeaderSize));
+   if (status != KEL_STATUS_OK) return status;
+   if (total > SIZE_MAX) return KEL_STATUS_NO_MEMORY;
+   char *buf = static_cast<char *>(std::malloc(size_t(total)));
+   if (buf == nullptr) return KEL_STATUS_NO_MEMORY;
+   std::memcpy(buf, header, kHeaderSize);
+   size_t at = kHeaderSize;
+   while (at < total) {
+      ssize_t got = ReadSome(fd, buf + at, size_t(total) - at);
+      if (got <= 0) {
+         std::free(buf);
+         return got == 0 ? KEL_STATUS_CACHE_TRUNCATED : KEL_STATUS_CACHE_OPEN;
+      }
+      at += size_t(got);
+   }
+   char extra;
+   if (ReadSome(fd, &extra, 1) != 0) {  // more than the header claims
+      std::free(buf);
+      return KEL_STATUS_CACHE_CORRUPT;
+   }
+   owned_ = buf;
+   bytes_ = {buf, size_t(total)};
    return KEL_STATUS_OK;
 }
 
 KEL_Status CacheReader::Open(const char *path, int flags) {
    Close();
-   // Opening never waits (a FIFO without a writer would block a plain
-   // open); what is not a regular file is refused right after.
+   // Opening never waits (a FIFO without a writer would block a plain open).
    int fd = open(path, O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY);
-   if (fd < 0) return KEL_STATUS_CACHE_OPEN;
+   if (fd < 0) return OpenError(errno);
    struct stat st;
-   if (fstat(fd, &st) != 0 || !S_ISREG(st.st_mode)) {
+   if (fstat(fd, &st) != 0) {
       close(fd);
       return KEL_STATUS_CACHE_OPEN;
    }
-   uint64_t fileSize = uint64_t(st.st_size);
-   if (fileSize < kHeaderSize) {
+   if (S_ISFIFO(st.st_mode)) {
+      KEL_Status status = ReadPipe(fd);
       close(fd);
-      return fileSize == 0 ? KEL_STATUS_CACHE_FORMAT : KEL_STATUS_CACHE_TRUNCATED;
+      if (status == KEL_STATUS_OK) status = Attach(bytes_, flags);
+      if (status != KEL_STATUS_OK) Close();
+      return status;
+   }
+   if (!S_ISREG(st.st_mode)) {
+      close(fd);
+      return S_ISDIR(st.st_mode) ? KEL_STATUS_CACHE_FOLDER : KEL_STATUS_CACHE_NOT_REGULAR;
+   }
+   uint64_t fileSize = uint64_t(st.st_size);
+   if (fileSize == 0) {
+      close(fd);
+      return KEL_STATUS_CACHE_FORMAT;
    }
    // The header decides first, so that a file larger than the format allows
    // (or than a 32-bit size_t holds) is never mapped.
    uint8_t header[kHeaderSize];
-   if (pread(fd, header, kHeaderSize, 0) != ssize_t(kHeaderSize)) {
+   size_t want = size_t(std::min<uint64_t>(fileSize, kHeaderSize));
+   if (pread(fd, header, want, 0) != ssize_t(want)) {
       close(fd);
       return KEL_STATUS_CACHE_OPEN;
+   }
+   if (want < kHeaderSize) {
+      close(fd);
+      if (LooksLikeJson(header, want)) return KEL_STATUS_CACHE_JSON;
+      return std::memcmp(header, kCacheMagic, std::min(want, sizeof kCacheMagic)) == 0
+                ? KEL_STATUS_CACHE_TRUNCATED
+                : KEL_STATUS_CACHE_FORMAT;
    }
    KEL_Status status = CheckHeader(header, fileSize);
    if (status != KEL_STATUS_OK) {
@@ -247,47 +390,103 @@ KEL_Status CacheReader::Open(const char *path, int flags) {
 
 KEL_Status CacheReader::Attach(std::string_view bytes, int flags) {
    const auto *p = reinterpret_cast<const uint8_t *>(bytes.data());
-   if (bytes.size() < kHeaderSize) return KEL_STATUS_CACHE_TRUNCATED;
+   if (bytes.size() < kHeaderSize) {
+      if (LooksLikeJson(p, bytes.size())) return KEL_STATUS_CACHE_JSON;
+      return bytes.size() == 0 || std::memcmp(p, kCacheMagic, std::min(bytes.size(), sizeof kCacheMagic)) != 0
+                ? KEL_STATUS_CACHE_FORMAT
+                : KEL_STATUS_CACHE_TRUNCATED;
+   }
    KEL_Status status = CheckHeader(p, bytes.size());
    if (status != KEL_STATUS_OK) return status;
-   if (!(flags & KEL_CACHE_NO_CHECKSUM) &&
-       Checksum(p + kHeaderSize, bytes.size() - kHeaderSize) != LoadU64(p + 72))
-      return KEL_STATUS_CACHE_CORRUPT;
    bytes_ = bytes;
    count_ = LoadU32(p + 56);
-   indexOffset_ = LoadU32(p + 60);
-   return KEL_STATUS_OK;
+   slots_ = LoadU32(p + 80);
+   order_.clear();
+   ordered_ = false;
+   if (!(flags & kCacheQuickOpen)) status = Verify(flags);
+   if (status != KEL_STATUS_OK) {
+      bytes_ = {};
+      count_ = slots_ = 0;
+   }
+   return status;
 }
 
-bool CacheReader::EntryAt(uint32_t i, std::string_view *key, CacheHit *hit) const {
-   if (i >= count_) return false;
-   const auto *ix = reinterpret_cast<const uint8_t *>(bytes_.data()) + indexOffset_ +
-                    size_t(i) * kIndexEntrySize;
-   uint32_t keyOff = LoadU32(ix), keyLen = LoadU32(ix + 4);
-   uint32_t dataOff = LoadU32(ix + 12), dataLen = LoadU32(ix + 16);
+KEL_Status CacheReader::Verify(int flags) const {
+   const auto *p = reinterpret_cast<const uint8_t *>(bytes_.data());
+   if (bytes_.size() < kHeaderSize) return KEL_STATUS_CACHE_TRUNCATED;
+   if (!(flags & KEL_CACHE_NO_CHECKSUM) &&
+       Checksum(p + kHeaderSize, bytes_.size() - kHeaderSize) != LoadU64(p + 72))
+      return KEL_STATUS_CACHE_CORRUPT;
+   uint32_t used = 0;
+   for (uint32_t i = 0; i < slots_; i++) {
+      std::string_view key;
+      CacheHit hit;
+      uint32_t tag;
+      if (SlotAt(i, &key, &hit, &tag)) {
+         used++;
+         CacheHit found;
+         // Found, and found at this very slot (a second slot with the same
+         // key would be shadowed by the first).
+         if (key.size() < 3 || tag != uint32_t(KeyHash(key) >> 32) || Lookup(key, &found) != KEL_STATUS_OK ||
+             found.data.data() != hit.data.data() || found.status != hit.status)
+            return KEL_STATUS_CACHE_CORRUPT;
+      } else if (LoadU32(p + kHeaderSize + size_t(i) * kSlotSize + 8) != 0) {
+         return KEL_STATUS_CACHE_CORRUPT;  // a slot whose key or data lies outside the file
+      }
+   }
+   return used == count_ ? KEL_STATUS_OK : KEL_STATUS_CACHE_CORRUPT;
+}
+
+bool CacheReader::SlotAt(uint32_t i, std::string_view *key, CacheHit *hit, uint32_t *tag) const {
+   if (i >= slots_) return false;
+   const auto *s = reinterpret_cast<const uint8_t *>(bytes_.data()) + kHeaderSize + size_t(i) * kSlotSize;
+   uint32_t keyOff = LoadU32(s + 4), keyLen = LoadU32(s + 8);
+   uint32_t dataOff = LoadU32(s + 16), dataLen = LoadU32(s + 20);
+   if (keyLen == 0) return false;
    if (keyOff > bytes_.size() || bytes_.size() - keyOff < keyLen) return false;
    if (dataOff > bytes_.size() || bytes_.size() - dataOff < dataLen) return false;
    *key = bytes_.substr(keyOff, keyLen);
-   hit->status = LoadU32(ix + 8);
+   hit->status = LoadU32(s + 12);
    hit->data = bytes_.substr(dataOff, dataLen);
+   *tag = LoadU32(s);
    return true;
 }
 
-KEL_Status CacheReader::Lookup(std::string_view key, CacheHit *hit) const {
-   uint32_t lo = 0, hi = count_;
-   while (lo < hi) {
-      uint32_t mid = lo + (hi - lo) / 2;
-      std::string_view k;
-      CacheHit h;
-      if (!EntryAt(mid, &k, &h)) return KEL_STATUS_CACHE_CORRUPT;
-      if (KeyLess(k, key)) {
-         lo = mid + 1;
-      } else if (KeyLess(key, k)) {
-         hi = mid;
-      } else {
-         *hit = h;
-         return KEL_STATUS_OK;
+bool CacheReader::EntryAt(uint32_t i, std::string_view *key, CacheHit *hit) const {
+   if (!ordered_) {
+      // The occupied slots, in the order of their keys.
+      order_.clear();
+      std::vector<std::string_view> keys(slots_);
+      for (uint32_t s = 0; s < slots_; s++) {
+         CacheHit h;
+         uint32_t tag;
+         if (SlotAt(s, &keys[s], &h, &tag)) order_.push_back(s);
       }
+      std::sort(order_.begin(), order_.end(), [&keys](uint32_t a, uint32_t b) { return KeyLess(keys[a], keys[b]); });
+      ordered_ = true;
+   }
+   uint32_t tag;
+   return i < count_ && i < order_.size() && SlotAt(order_[i], key, hit, &tag);
+}
+
+KEL_Status CacheReader::Lookup(std::string_view key, CacheHit *hit) const {
+   if (slots_ == 0) return KEL_STATUS_NOT_FOUND;
+   const uint32_t tag = uint32_t(KeyHash(key) >> 32), mask = slots_ - 1;
+   const auto *base = reinterpret_cast<const uint8_t *>(bytes_.data()) + kHeaderSize;
+   uint32_t i = uint32_t(HomeHash(key)) & mask;
+   for (uint32_t probes = 0; probes < slots_; probes++, i = (i + 1) & mask) {
+      const uint8_t *s = base + size_t(i) * kSlotSize;
+      uint32_t keyLen = LoadU32(s + 8);
+      if (keyLen == 0) return KEL_STATUS_NOT_FOUND;
+      if (LoadU32(s) != tag || keyLen != key.size()) continue;
+      uint32_t keyOff = LoadU32(s + 4);
+      if (keyOff > bytes_.size() || bytes_.size() - keyOff < keyLen) return KEL_STATUS_CACHE_CORRUPT;
+      if (std::memcmp(bytes_.data() + keyOff, key.data(), keyLen) != 0) continue;
+      uint32_t dataOff = LoadU32(s + 16), dataLen = LoadU32(s + 20);
+      if (dataOff > bytes_.size() || bytes_.size() - dataOff < dataLen) return KEL_STATUS_CACHE_CORRUPT;
+      hit->status = LoadU32(s + 12);
+      hit->data = bytes_.substr(dataOff, dataLen);
+      return KEL_STATUS_OK;
    }
    return KEL_STATUS_NOT_FOUND;
 }

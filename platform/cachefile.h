@@ -3,18 +3,34 @@
 // Layout (all integers little-endian):
 //
 //   0   8  magic "ORXKELC1"
-//   8   4  format version (1)
+//   8   4  format version (2)
 //  12   4  flags (0)
 //  16  16  tree signature
 //  32  24  kernel build date, NUL-padded (at most 20 characters)
 //  56   4  entry count N
-//  60   4  index offset
+//  60   4  slot table offset (96)
 //  64   8  total file size (at most 4 GiB - 1: offsets are 32 bits)
-//  72   8  checksum of bytes 80 .. total size
-//  80      index: N entries of 20 bytes, sorted by their key bytes
-//          (memcmp order, a shorter key first on a common prefix):
-//            0 key offset, 4 key length, 8 status, 12 data offset, 16 data length
-//          then the key bytes and the data bytes the entries point at.
+//  72   8  checksum of bytes 96 .. total size
+//  80   4  slot count S (a power of two, more than N)
+//  84   4  offset of the first key byte (96 + 24 * S)
+//  88   4  reserved (0)
+//  92   4  check of bytes 56 .. 92, the fields that place everything else
+//  96      slot table: S slots of 24 bytes, a hash table with linear probing:
+//            0 hash tag (high 32 bits of the whole key's 64-bit hash),
+//            4 key offset, 8 key length (0: an empty slot), 12 status,
+//            16 data offset, 20 data length
+//          then, per entry in slot order, its key bytes directly followed by
+//          its data bytes, so that a lookup touches the slot and one place in
+//          the file.
+//
+// A lookup starts at slot (home hash & (S - 1)), the home hash being that of
+// the instance keys alone, and walks on to the first empty slot: the
+// entries of one instance share a first slot and so lie side by side, in
+// the slot table and in the file.  Opening checks the header and that the slot table and key area lie
+// within the file (no pass over the data); every offset and length a slot
+// holds is checked when the slot is used.  A full verification (checksum,
+// every slot in bounds, every key found where its hash leads) is kept for
+// `kelcache verify` and `kelcache dump`.
 //
 // A key is: operation (1 byte), node number (2 bytes), then each instance
 // key as kind (1 byte) and either a 64-bit value (kind other than 1) or a
@@ -33,6 +49,7 @@
 #define PLATFORM_CACHEFILE_H
 
 #include <cstdint>
+#include <algorithm>
 #include <cstring>
 #include <optional>
 #include <span>
@@ -48,9 +65,11 @@ namespace kelplat {
 enum class Op : uint8_t { Get = 'G', List = 'L', Set = 'S', Data = 'D', Meta = 'M' };
 
 constexpr char kCacheMagic[8] = {'O', 'R', 'X', 'K', 'E', 'L', 'C', '1'};
-constexpr uint32_t kCacheVersion = 1;
-constexpr size_t kHeaderSize = 80;
-constexpr size_t kIndexEntrySize = 20;
+constexpr uint32_t kCacheVersion = 2;
+constexpr size_t kHeaderSize = 96;
+constexpr size_t kSlotSize = 24;
+// The header fields that the header check covers.
+constexpr size_t kHeaderCheckStart = 56, kHeaderCheckOffset = 92;
 constexpr size_t kBuildDateMax = 20;
 // Every byte of a file lies at an offset that 32 bits can name.
 constexpr uint64_t kMaxCacheFileSize = 0xffffffff;
@@ -78,6 +97,9 @@ struct Key {
 };
 
 void AppendKey(std::string &out, const Key &key);
+// Appends the lookup key of a parameter list to out (cleared first), reusing
+// its storage; false when an entry cannot be encoded.
+bool AppendParamLookup(std::string &out, Op op, KEL_Node node, const KEL_ParamList *keys);
 std::string EncodeLookup(Op op, KEL_Node node, std::span<const Key> keys);
 // The lookup key for a parameter list, or nothing when an entry cannot be encoded.
 std::optional<std::string> EncodeParamLookup(Op op, KEL_Node node, const KEL_ParamList *keys);
@@ -88,6 +110,25 @@ bool DecodeList(std::string_view bytes, std::vector<Key> *keys);
 std::string EncodeList(std::span<const Key> keys);
 
 uint64_t Checksum(const uint8_t *p, size_t n);
+// The hash of a whole lookup key: its high 32 bits are a slot's tag.
+inline uint64_t KeyHash(std::string_view key) {
+   return Checksum(reinterpret_cast<const uint8_t *>(key.data()), key.size());
+}
+// The hash that picks a key's first slot: that of its instance keys alone
+// (after the operation and node), so that every read and listing of one
+// instance (a world's name, record and statistics, the cartel of the same
+// number) lies in neighbouring slots, and their bytes side by side.
+inline uint64_t HomeHash(std::string_view key) {
+   size_t skip = std::min<size_t>(key.size(), 3);
+   return Checksum(reinterpret_cast<const uint8_t *>(key.data()) + skip, key.size() - skip);
+}
+// The check stored at kHeaderCheckOffset of a header.
+uint32_t HeaderCheck(const uint8_t *header);
+
+// Flags of CacheReader::Open and Attach beyond KEL_CACHE_NO_CHECKSUM.
+// Without kCacheQuickOpen the whole file is verified; with it only what
+// opening needs, in time independent of the file's size.
+constexpr int kCacheQuickOpen = 0x100;
 
 // Builds a cache file in memory.
 class CacheWriter {
@@ -124,9 +165,14 @@ public:
    CacheReader &operator=(const CacheReader &) = delete;
    ~CacheReader();
 
+   // Maps a regular file, or reads a pipe whole into memory.
    KEL_Status Open(const char *path, int flags);
    // Checks the bytes as Open does; the caller keeps them alive.
    KEL_Status Attach(std::string_view bytes, int flags);
+   // The full verification of the attached bytes: checksum (unless
+   // KEL_CACHE_NO_CHECKSUM), every slot in bounds, every key found where
+   // its hash leads, exactly N entries.
+   KEL_Status Verify(int flags) const;
 
    // Status NOT_FOUND when absent, CACHE_CORRUPT when the index is damaged.
    KEL_Status Lookup(std::string_view key, CacheHit *hit) const;
@@ -134,17 +180,26 @@ public:
    std::span<const uint8_t, 16> Signature() const;
    std::string BuildDate() const;
    uint32_t EntryCount() const { return count_; }
-   // Entry i in index order: its key, status and data; false when damaged.
+   uint32_t SlotCount() const { return slots_; }
+   // Entry i in key order: its key, status and data; false when damaged
+   // (also when the slot table holds fewer than N entries).
    bool EntryAt(uint32_t i, std::string_view *key, CacheHit *hit) const;
+   // Slot i: false when empty or damaged.
+   bool SlotAt(uint32_t i, std::string_view *key, CacheHit *hit, uint32_t *tag) const;
    std::string_view Bytes() const { return bytes_; }
 
 private:
    void Close();
+   KEL_Status ReadPipe(int fd);
    std::string_view bytes_;
    void *map_ = nullptr;
    size_t mapSize_ = 0;
+   char *owned_ = nullptr;  // the bytes read from a pipe (malloc)
    uint32_t count_ = 0;
-   uint32_t indexOffset_ = 0;
+   uint32_t slots_ = 0;
+   // The occupied slots in key order, built at the first EntryAt.
+   mutable std::vector<uint32_t> order_;
+   mutable bool ordered_ = false;
 };
 
 }  // namespace kelplat

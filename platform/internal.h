@@ -15,11 +15,21 @@ struct KEL_Param {
    uint32_t kind;
    uint32_t reserved;
    uint64_t value;
-   char *text;  // owned; set for KEL_PARAM_STRING entries
+   char *text;  // set for KEL_PARAM_STRING entries; held by the list's text chunks
+};
+
+// The texts of a list's entries live in chunks that never move, so a text
+// pointer stays valid for the list's life; appending a text costs no
+// allocation of its own, and removing the last entry gives its bytes back.
+struct KEL_TextChunk {
+   char *bytes;  // malloc
+   size_t used;
+   size_t size;
 };
 
 struct KEL_ParamList {
    std::vector<KEL_Param> entries;
+   std::vector<KEL_TextChunk> chunks;
 };
 
 // Data object: word 0 the capacity, word 1 the number of bytes held.

@@ -1,10 +1,14 @@
 // The KEL calls: node table, backends (none, cache file, simulator) and the
 // reads, listings, sets and data calls over them.
+#include <errno.h>
 #include <sys/stat.h>
 
 #include <algorithm>
+#include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <new>
+#include <stdexcept>
 
 #include "cachefile.h"
 #include "internal.h"
@@ -58,6 +62,8 @@ struct Tree {
    Backend backend = Backend::None;
    bool loaded = false;
    CacheReader reader;
+   // The lookup key of the current call, kept so that its storage is reused.
+   std::string lookup;
 };
 
 Tree &TheTree() {
@@ -66,6 +72,19 @@ Tree &TheTree() {
 }
 
 uint32_t KeyCount(const KEL_ParamList *keys) { return KEL_ParamListUsedCount(keys); }
+
+// No exception leaves a KEL call: running out of memory inside one is its
+// status.
+template <class F>
+KEL_Status NoThrow(F call) {
+   try {
+      return call();
+   } catch (const std::bad_alloc &) {
+      return KEL_STATUS_NO_MEMORY;
+   } catch (const std::length_error &) {
+      return KEL_STATUS_NO_MEMORY;
+   }
+}
 
 }  // namespace
 
@@ -103,12 +122,17 @@ static bool TreeLookup(Op op, KEL_Node node, const KEL_ParamList *keys, CacheHit
       *status = KEL_STATUS_NO_TREE;
       return false;
    }
-   std::optional<std::string> lookup = EncodeParamLookup(op, node, keys);
-   if (!lookup) {
+   bool encoded = false;
+   *status = NoThrow([&] {
+      encoded = AppendParamLookup(t.lookup, op, node, keys);
+      return KEL_STATUS_OK;
+   });
+   if (*status != KEL_STATUS_OK) return false;
+   if (!encoded) {
       *status = KEL_STATUS_BAD_PARAM;
       return false;
    }
-   *status = t.reader.Lookup(*lookup, hit);
+   *status = t.reader.Lookup(t.lookup, hit);
    return *status == KEL_STATUS_OK;
 }
 
@@ -136,6 +160,49 @@ const char *SimulatorPath() {
    return path != nullptr && *path != '\0' ? path : nullptr;
 }
 
+// A listing payload (a count, then the keys) as a new parameter list.
+static KEL_Status ListFromStored(std::string_view bytes, KEL_ParamList **list) {
+   const auto *p = reinterpret_cast<const uint8_t *>(bytes.data());
+   if (bytes.size() < 4) return KEL_STATUS_CACHE_CORRUPT;
+   uint32_t count = LoadU32(p);
+   // Each key takes at least 5 bytes (an empty text): a larger count is damage.
+   if (count > (bytes.size() - 4) / 5) return KEL_STATUS_CACHE_CORRUPT;
+   KEL_ParamList *out = KEL_ParamListCreate(1, int(std::min<uint32_t>(count, 1 << 20)));
+   if (out == nullptr) return KEL_STATUS_NO_MEMORY;
+   size_t at = 4;
+   KEL_Status status = KEL_STATUS_OK;
+   for (uint32_t i = 0; i < count && status == KEL_STATUS_OK; i++) {
+      if (at >= bytes.size()) {
+         status = KEL_STATUS_CACHE_CORRUPT;
+         break;
+      }
+      uint32_t kind = p[at++];
+      if (kind == KEL_PARAM_STRING) {
+         if (bytes.size() - at < 4 || bytes.size() - at - 4 < LoadU32(p + at)) {
+            status = KEL_STATUS_CACHE_CORRUPT;
+            break;
+         }
+         uint32_t len = LoadU32(p + at);
+         status = ParamListAppend(out, kind, 0, bytes.data() + at + 4, len);
+         at += 4 + size_t(len);
+      } else {
+         if (bytes.size() - at < 8) {
+            status = KEL_STATUS_CACHE_CORRUPT;
+            break;
+         }
+         status = ParamListAppend(out, kind, LoadU64(p + at), nullptr, 0);
+         at += 8;
+      }
+   }
+   if (status == KEL_STATUS_OK && at != bytes.size()) status = KEL_STATUS_CACHE_CORRUPT;
+   if (status != KEL_STATUS_OK) {
+      KEL_ParamListDestroy(out);
+      return status;
+   }
+   *list = out;
+   return KEL_STATUS_OK;
+}
+
 }  // namespace kelplat
 
 extern "C" {
@@ -152,14 +219,19 @@ int OrxSyscall_Init(int channel, int flags, int reserved) {
    const char *path = SimulatorPath();
    if (path == nullptr) return -1;
    t.backend = Backend::Simulator;
-   t.loaded = t.reader.Open(path, 0) == KEL_STATUS_OK;
+   KEL_Status status = NoThrow([&] { return t.reader.Open(path, kCacheQuickOpen); });
+   t.loaded = status == KEL_STATUS_OK;
+   // The signature check that follows can only say "unavailable": this line
+   // says which file and why.
+   if (!t.loaded)
+      std::fprintf(stderr, "Couldn't load simulator snapshot %s: %s\n", path, ORX_ReturnStatusToString(status));
    return t.loaded ? 0 : -1;
 }
 
 KEL_Status KEL_UseCache(const char *path, int flags) {
    Tree &t = TheTree();
    if (path == nullptr) return KEL_STATUS_BAD_PARAM;
-   KEL_Status status = t.reader.Open(path, flags);
+   KEL_Status status = NoThrow([&] { return t.reader.Open(path, flags | kCacheQuickOpen); });
    t.loaded = status == KEL_STATUS_OK;
    t.backend = t.loaded ? Backend::Cache : Backend::None;
    return status;
@@ -168,10 +240,14 @@ KEL_Status KEL_UseCache(const char *path, int flags) {
 int KEL_CheckSig(char *buf, size_t len, const char **mine) {
    Tree &t = TheTree();
    if (mine != nullptr) *mine = ToolBuildDate();
-   std::string date;
+   char stored[kBuildDateMax + 1] = "";
+   std::string_view date;
    int mismatch = 0;
    if (t.loaded) {
-      date = t.reader.BuildDate();
+      std::string_view raw = t.reader.Bytes().substr(32, kBuildDateMax);
+      raw = raw.substr(0, std::min(raw.find('\0'), raw.size()));
+      if (!raw.empty()) std::memcpy(stored, raw.data(), raw.size());
+      date = {stored, raw.size()};
       mismatch = !std::equal(ToolSignature().begin(), ToolSignature().end(), t.reader.Signature().begin());
    } else if (t.backend == Backend::Simulator) {
       // A simulator whose snapshot cannot be read has no kernel to match.
@@ -180,7 +256,7 @@ int KEL_CheckSig(char *buf, size_t len, const char **mine) {
    }
    if (buf != nullptr && len > 0) {
       size_t n = std::min(date.size(), len - 1);
-      std::memcpy(buf, date.data(), n);
+      if (n > 0) std::memcpy(buf, date.data(), n);
       buf[n] = '\0';
    }
    return mismatch;
@@ -192,11 +268,19 @@ KEL_Status KEL_Get(KEL_Node node, const KEL_ParamList *keys, void *buf, uint32_t
    if (buf == nullptr && size > 0) return KEL_STATUS_BAD_PARAM;
    if (KeyCount(keys) != LevelCount(info->path)) return KEL_STATUS_BAD_KEY_COUNT;
    KEL_Status status;
-   if (InSimulator() && SimulatorClock(*info, buf, size, &status)) return status;
+   if (InSimulator()) {
+      bool answered = false;
+      KEL_Status thrown = NoThrow([&] {
+         answered = SimulatorClock(*info, buf, size, &status);
+         return KEL_STATUS_OK;
+      });
+      if (thrown != KEL_STATUS_OK) return thrown;
+      if (answered) return status;
+   }
    CacheHit hit;
    if (!TreeLookup(Op::Get, node, keys, &hit, &status)) {
       // A record stored in the snapshot wins; the simulator answers the rest.
-      if (status == KEL_STATUS_NOT_FOUND && InSimulator()) return SimulatorInodeStats(*info, keys, buf, size);
+      if (status == KEL_STATUS_NOT_FOUND && InSimulator()) return NoThrow([&] { return SimulatorInodeStats(*info, keys, buf, size); });
       return status;
    }
    if (hit.status != KEL_STATUS_OK) return hit.status;
@@ -216,7 +300,7 @@ KEL_Status KEL_Set(KEL_Node node, const KEL_ParamList *keys, const KEL_ParamList
    if (TreeLookup(Op::Set, node, keys, &hit, &status)) return hit.status;
    if (status != KEL_STATUS_NOT_FOUND) return status;
    if (!InSimulator()) return KEL_STATUS_READ_ONLY;
-   return SimulatorSet(*info, input, buf, size);
+   return NoThrow([&] { return SimulatorSet(*info, input, buf, size); });
 }
 
 KEL_Status KEL_GetInstanceListAlloc(KEL_Node node, const KEL_ParamList *keys, KEL_ParamList **list) {
@@ -229,20 +313,7 @@ KEL_Status KEL_GetInstanceListAlloc(KEL_Node node, const KEL_ParamList *keys, KE
    CacheHit hit;
    if (!TreeLookup(Op::List, node, keys, &hit, &status)) return status;
    if (hit.status != KEL_STATUS_OK) return hit.status;
-   std::vector<Key> found;
-   if (!DecodeList(hit.data, &found)) return KEL_STATUS_CACHE_CORRUPT;
-   KEL_ParamList *out = KEL_ParamListCreate(1, int(std::min<size_t>(found.size(), 1 << 20)));
-   if (out == nullptr) return KEL_STATUS_NO_MEMORY;
-   for (const Key &k : found) {
-      bool text = k.kind == KEL_PARAM_STRING;
-      status = ParamListAppend(out, k.kind, k.value, text ? k.text.data() : nullptr, k.text.size());
-      if (status != KEL_STATUS_OK) {
-         KEL_ParamListDestroy(out);
-         return status;
-      }
-   }
-   *list = out;
-   return KEL_STATUS_OK;
+   return NoThrow([&] { return ListFromStored(hit.data, list); });
 }
 
 KEL_Status KEL_GetInstanceListAllocHint(KEL_Node node, const KEL_ParamList *keys, uint32_t hint,
@@ -297,8 +368,13 @@ KEL_Status KEL_SetData(KEL_Node node, const KEL_ParamList *keys, const KELData *
 }
 
 int OrxFs_Lstat(const char *path, struct stat *st) {
-   if (InSimulator()) return SimulatorLstat(path, st);
-   return lstat(path, st);
+   if (!InSimulator()) return lstat(path, st);
+   try {
+      return SimulatorLstat(path, st);
+   } catch (const std::exception &) {  // out of memory, as lstat reports it
+      errno = ENOMEM;
+      return -1;
+   }
 }
 
 }  // extern "C"

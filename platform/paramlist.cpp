@@ -1,4 +1,5 @@
 // Parameter lists and data objects.
+#include <algorithm>
 #include <cstdint>
 #include <cstdlib>
 #include <cstring>
@@ -8,20 +9,41 @@
 
 namespace kelplat {
 
+// Room for n bytes in the list's last text chunk, or a new chunk.
+static char *TextRoom(KEL_ParamList *list, size_t n) {
+   constexpr size_t kChunkSize = 4096;
+   if (list->chunks.empty() || list->chunks.back().size - list->chunks.back().used < n) {
+      size_t size = std::max(n, kChunkSize);
+      char *bytes = static_cast<char *>(std::malloc(size));
+      if (bytes == nullptr) return nullptr;
+      try {
+         list->chunks.push_back({bytes, 0, size});
+      } catch (const std::exception &) {
+         std::free(bytes);
+         return nullptr;
+      }
+   }
+   KEL_TextChunk &c = list->chunks.back();
+   char *at = c.bytes + c.used;
+   c.used += n;
+   return at;
+}
+
 KEL_Status ParamListAppend(KEL_ParamList *list, uint32_t kind, uint64_t value, const char *text,
                            size_t textLength) {
    if (list == nullptr) return KEL_STATUS_BAD_PARAM;
+   if (textLength >= SIZE_MAX - 1) return KEL_STATUS_NO_MEMORY;
    KEL_Param p{kind, 0, value, nullptr};
    if (text != nullptr) {
-      p.text = static_cast<char *>(std::malloc(textLength + 1));
+      p.text = TextRoom(list, textLength + 1);
       if (p.text == nullptr) return KEL_STATUS_NO_MEMORY;
       std::memcpy(p.text, text, textLength);
       p.text[textLength] = '\0';
    }
    try {
       list->entries.push_back(p);
-   } catch (const std::bad_alloc &) {
-      std::free(p.text);
+   } catch (const std::exception &) {
+      if (p.text != nullptr) list->chunks.back().used -= textLength + 1;
       return KEL_STATUS_NO_MEMORY;
    }
    return KEL_STATUS_OK;
@@ -37,7 +59,7 @@ KEL_ParamList *KEL_ParamListCreate(int kind, int capacity) {
    if (list == nullptr) return nullptr;
    try {
       if (capacity > 0) list->entries.reserve(size_t(capacity));
-   } catch (const std::bad_alloc &) {
+   } catch (const std::exception &) {
       delete list;
       return nullptr;
    }
@@ -59,13 +81,17 @@ uint32_t KEL_ParamListUsedCount(const KEL_ParamList *list) {
 
 void KEL_ParamListRemoveLastParam(KEL_ParamList *list) {
    if (list == nullptr || list->entries.empty()) return;
-   std::free(list->entries.back().text);
+   // The last entry's text is the last one in the last chunk: give it back.
+   if (const char *text = list->entries.back().text; text != nullptr && !list->chunks.empty()) {
+      KEL_TextChunk &c = list->chunks.back();
+      if (text >= c.bytes && text < c.bytes + c.used) c.used = size_t(text - c.bytes);
+   }
    list->entries.pop_back();
 }
 
 void KEL_ParamListDestroy(KEL_ParamList *list) {
    if (list == nullptr) return;
-   for (KEL_Param &p : list->entries) std::free(p.text);
+   for (KEL_TextChunk &c : list->chunks) std::free(c.bytes);
    delete list;
 }
 

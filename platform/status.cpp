@@ -28,6 +28,12 @@ constexpr StatusText kStatusTexts[] = {
    {KEL_STATUS_CACHE_VERSION, "Unsupported cache file version"},
    {KEL_STATUS_CACHE_CORRUPT, "Corrupt cache file"},
    {KEL_STATUS_CACHE_TRUNCATED, "Truncated cache file"},
+   {KEL_STATUS_CACHE_NO_FILE, "No such file"},
+   {KEL_STATUS_CACHE_DENIED, "Permission denied"},
+   {KEL_STATUS_CACHE_FOLDER, "Is a folder, not a cache file"},
+   {KEL_STATUS_CACHE_NOT_REGULAR, "Not a regular file or a pipe"},
+   {KEL_STATUS_CACHE_JSON, "A JSON snapshot, not a cache file (build one with: kelcache build SNAPSHOT -o FILE)"},
+   {KEL_STATUS_CACHE_EMPTY_PIPE, "Nothing was written to the pipe"},
    {KEL_STATUS_BAD_TIME, "Invalid date or time"},
    {KEL_STATUS_NO_CARTEL, "No such cartel"},
 };

@@ -38,6 +38,12 @@ enum {
    KEL_STATUS_CACHE_VERSION = 0xbad0033,
    KEL_STATUS_CACHE_CORRUPT = 0xbad0034,
    KEL_STATUS_CACHE_TRUNCATED = 0xbad0035,
+   KEL_STATUS_CACHE_NO_FILE = 0xbad0036,
+   KEL_STATUS_CACHE_DENIED = 0xbad0037,
+   KEL_STATUS_CACHE_FOLDER = 0xbad0038,
+   KEL_STATUS_CACHE_NOT_REGULAR = 0xbad0039,
+   KEL_STATUS_CACHE_JSON = 0xbad003a,
+   KEL_STATUS_CACHE_EMPTY_PIPE = 0xbad003b,
    KEL_STATUS_BAD_TIME = 0xbad0040,
    KEL_STATUS_NO_CARTEL = 0xbad0062,
 };
@@ -95,7 +101,9 @@ int HostType_OSIsORX(void);
 int HostType_OSIsSimulator(void);
 int OrxSyscall_Init(int channel, int flags, int reserved);
 
-/* Read from a cache file from now on.  Flags: 0, or KEL_CACHE_NO_CHECKSUM. */
+/* Read from a cache file (or a pipe, read whole) from now on.  Opening checks
+ * the header and the tables' bounds only, so flags are 0; KEL_CACHE_NO_CHECKSUM
+ * is accepted and changes nothing (`kelcache verify` checks the checksum). */
 enum { KEL_CACHE_NO_CHECKSUM = 1 };
 KEL_Status KEL_UseCache(const char *path, int flags);
 

@@ -104,3 +104,68 @@ timeout: 5
 exit: 1
 --- stderr
 kelcache: @TMP/big.cache: Corrupt cache file
+=== case a cache through a pipe on standard input is read whole
+snapshot: tiny
+exe: /bin/sh
+argv: sh -c 'cat @CACHE | @BIN/orxkeltools -c /dev/stdin halvex -v'
+exit: 0
+--- stdout
+Orvik 9.1.0 build-00042
+=== case a cache through a process substitution is read whole
+snapshot: tiny
+exe: /bin/bash
+argv: bash -c '@BIN/orxkeltools -c <(gzip -c @CACHE | gzip -dc) halvex -v'
+exit: 0
+--- stdout
+Orvik 9.1.0 build-00042
+=== case a pipe that ends inside the cache is a truncated file
+snapshot: tiny
+exe: /bin/sh
+argv: sh -c 'head -c 200 @CACHE | @BIN/orxkeltools -c /dev/stdin halvex -v'
+exit: 1
+--- stderr
+Couldn't use specifed cache file /dev/stdin: Truncated cache file
+=== case a FIFO nobody writes to says so
+mode: plain
+setup: mkfifo fifo
+run: -c @TMP/fifo halvex -v
+timeout: 10
+exit: 1
+--- stderr
+Couldn't use specifed cache file @TMP/fifo: Nothing was written to the pipe
+=== case a character device is refused with its own status
+mode: plain
+run: -c /dev/null halvex -v
+exit: 1
+--- stderr
+Couldn't use specifed cache file /dev/null: Not a regular file or a pipe
+=== case kelcache info shows what a cache holds and for which build
+snapshot: tiny
+exe: kelcache
+value: SIG @BIN/kelcache --tool-signature
+argv: kelcache info @CACHE
+exit: 0
+--- stdout
+file:        @CACHE
+signature:   @SIG (matches this build)
+build date:  Nov 30 2026
+size:        440 bytes
+entries:     1
+node                                      listings     reads      sets      data
+system_version                                   0         1         0         0
+=== case kelcache verify passes a built cache
+snapshot: tiny
+exe: kelcache
+argv: kelcache verify @CACHE
+exit: 0
+--- stdout
+@CACHE: OK, 1 entries, 440 bytes
+=== case kelcache --version names the version, the tree signature and the build date
+exe: kelcache
+value: SIG @BIN/kelcache --tool-signature
+argv: kelcache --version
+exit: 0
+--- stdout
+kelcache 1.0.0
+tree signature: @SIG
+build date: @BUILD_DATE

@@ -98,7 +98,7 @@ mode: plain
 run: -c @TMP/missing.cache halvex
 exit: 1
 --- stderr
-Couldn't use specifed cache file @TMP/missing.cache: Cannot open cache file
+Couldn't use specifed cache file @TMP/missing.cache: No such file
 === case a file that is not a cache file
 mode: plain
 setup: printf 'not a cache file at all, just some text that is long enough to pass the size test\n' > junk
@@ -260,3 +260,51 @@ halvex: invalid option -- 'c'
 halvex      -v, --version         Get version information for orvik
             -l, --level           Get release level information
             -h, --help            Print this menu
+=== case a folder as the cache file
+mode: plain
+run: -c @TMP halvex -v
+exit: 1
+--- stderr
+Couldn't use specifed cache file @TMP: Is a folder, not a cache file
+=== case a JSON snapshot given as the cache file gets the hint to build one
+snapshot: tiny
+mode: plain
+run: -c @CACHE.json halvex -v
+exit: 1
+--- stderr
+Couldn't use specifed cache file @CACHE.json: A JSON snapshot, not a cache file (build one with: kelcache build SNAPSHOT -o FILE)
+=== case a cache file of the previous format version
+snapshot: tiny
+mode: plain
+derive: OLD sh -c 'cp @CACHE old.cache && printf "\001" | dd of=old.cache bs=1 seek=8 conv=notrunc 2>/dev/null && echo @TMP/old.cache'
+run: -c @OLD halvex -v
+exit: 1
+--- stderr
+Couldn't use specifed cache file @TMP/old.cache: Unsupported cache file version
+=== case a simulator whose snapshot cannot be loaded names it before the signature message
+mode: plain
+env: ORXKEL_SIMULATOR=@TMP/missing.cache
+run: halvex -v
+exit: 1
+--- stderr
+Couldn't load simulator snapshot @TMP/missing.cache: No such file
+error: md5 signature mismatch with running orvik built on unavailable (my build date: @BUILD_DATE)
+=== case a simulator given a JSON snapshot says so
+snapshot: tiny
+mode: plain
+env: ORXKEL_SIMULATOR=@CACHE.json
+run: halvex -v
+exit: 1
+--- stderr
+Couldn't load simulator snapshot @CACHE.json: A JSON snapshot, not a cache file (build one with: kelcache build SNAPSHOT -o FILE)
+error: md5 signature mismatch with running orvik built on unavailable (my build date: @BUILD_DATE)
+=== case a damaged data byte passes opening and kelcache verify finds it
+snapshot: tiny
+exe: kelcache
+derive: BAD sh -c 'cp @CACHE bad.cache && n=$(($(stat -c %s bad.cache) - 1)) && printf "\377" | dd of=bad.cache bs=1 seek=$n conv=notrunc 2>/dev/null && echo @TMP/bad.cache'
+argv: kelcache verify @BAD
+check: @BIN/kelcache verify @CACHE >/dev/null
+check: ! @BIN/kelcache dump @BAD 2>/dev/null
+exit: 1
+--- stderr
+kelcache: @TMP/bad.cache: Corrupt cache file

@@ -2,8 +2,11 @@
 // the simulator's set and data calls, and the cache reader on damaged files.
 #include <gtest/gtest.h>
 #include <stdlib.h>
+#include <sys/stat.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <chrono>
 #include <cstring>
 #include <fstream>
@@ -197,10 +200,7 @@ TEST_F(CacheTest, SignatureAndBuildDate) {
    EXPECT_STREQ(mine, ToolBuildDate());
 
    std::string other = SmallCache("a date far too long for the field");
-   other[16] ^= 1;  // another signature
-   // Keep the checksum right: rebuild it over the changed bytes.
-   StoreU64(reinterpret_cast<uint8_t *>(other.data()) + 72,
-            Checksum(reinterpret_cast<const uint8_t *>(other.data()) + kHeaderSize, other.size() - kHeaderSize));
+   other[16] ^= 1;  // another signature: neither checksum nor header check covers it
    WriteFile(path_, other);
    ASSERT_EQ(KEL_UseCache(path_.c_str(), 0), KEL_STATUS_OK);
    EXPECT_NE(KEL_CheckSig(date, sizeof date, &mine), 0);
@@ -252,8 +252,12 @@ TEST(CacheReader, EveryTruncationFailsWithAStatus) {
    WriteFile(path, "");
    EXPECT_EQ(KEL_UseCache(path.c_str(), 0), KEL_STATUS_CACHE_FORMAT);
    unlink(path.c_str());
-   EXPECT_EQ(KEL_UseCache(path.c_str(), 0), KEL_STATUS_CACHE_OPEN);
-   EXPECT_EQ(KEL_UseCache("/", 0), KEL_STATUS_CACHE_OPEN);
+   EXPECT_EQ(KEL_UseCache(path.c_str(), 0), KEL_STATUS_CACHE_NO_FILE);
+   EXPECT_EQ(KEL_UseCache("/", 0), KEL_STATUS_CACHE_FOLDER);
+   EXPECT_EQ(KEL_UseCache("/dev/null", 0), KEL_STATUS_CACHE_NOT_REGULAR);
+   WriteFile(path, "  {\"buildDate\": \"Nov 3 2026\", \"tree\": {}}\n");
+   EXPECT_EQ(KEL_UseCache(path.c_str(), 0), KEL_STATUS_CACHE_JSON);
+   unlink(path.c_str());
    char buf[8];
    EXPECT_EQ(KEL_Get(KEL_NODE_system_bootOption, nullptr, buf, 4), KEL_STATUS_NO_TREE);
 }
@@ -270,7 +274,23 @@ TEST(CacheReader, ByteFlipsAreCaughtOrHarmless) {
       if (checked.Attach(bytes, 0) == KEL_STATUS_OK) {
          EXPECT_EQ(bytes.substr(kHeaderSize), good.substr(kHeaderSize));
       }
-      // Without it, every lookup and entry stays within the bytes.
+      // Opened quickly (no pass over the data), every lookup stays within
+      // the bytes, and verification catches what the checksum catches.
+      CacheReader quick;
+      if (quick.Attach(bytes, kCacheQuickOpen) == KEL_STATUS_OK) {
+         for (uint32_t i = 0; i < quick.SlotCount(); i++) {
+            std::string_view key;
+            CacheHit hit;
+            uint32_t tag;
+            if (!quick.SlotAt(i, &key, &hit, &tag)) continue;
+            CacheHit again;
+            quick.Lookup(key, &again);
+         }
+         if (quick.Verify(0) == KEL_STATUS_OK) {
+            EXPECT_EQ(bytes.substr(kHeaderSize), good.substr(kHeaderSize));
+         }
+      }
+      // Without the checksum, every lookup and entry stays within the bytes.
       CacheReader unchecked;
       if (unchecked.Attach(bytes, KEL_CACHE_NO_CHECKSUM) != KEL_STATUS_OK) continue;
       for (uint32_t i = 0; i < unchecked.EntryCount(); i++) {
@@ -364,4 +384,129 @@ TEST(CacheReader, SizesBeyondThirtyTwoBitOffsetsAreRefusedAtOnce) {
    EXPECT_EQ(KEL_UseCache(path.c_str(), 0), KEL_STATUS_CACHE_CORRUPT);
    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(1));
    unlink(path.c_str());
+}
+
+// Opening checks the header and where the tables lie, not the data: a
+// damaged data byte passes opening and is caught by the full verification.
+TEST(CacheReader, QuickOpenLeavesTheDataToVerification) {
+   std::string bytes = SmallCache();
+   bytes[bytes.size() - 3] ^= 0x40;
+   CacheReader quick;
+   ASSERT_EQ(quick.Attach(bytes, kCacheQuickOpen), KEL_STATUS_OK);
+   EXPECT_EQ(quick.Verify(0), KEL_STATUS_CACHE_CORRUPT);
+   CacheReader full;
+   EXPECT_EQ(full.Attach(bytes, 0), KEL_STATUS_CACHE_CORRUPT);
+
+   // Any change to the fields that place the tables is refused at opening.
+   for (size_t at = kHeaderCheckStart; at < kHeaderSize; at++) {
+      if (at >= 64 && at < 72) continue;  // the size: truncated or corrupt, tested apart
+      std::string b = SmallCache();
+      b[at] ^= 1;
+      CacheReader r;
+      EXPECT_EQ(r.Attach(b, kCacheQuickOpen), KEL_STATUS_CACHE_CORRUPT) << at;
+   }
+   // A file of the previous format version gets the version status.
+   std::string old = SmallCache();
+   StoreU32(reinterpret_cast<uint8_t *>(old.data()) + 8, 1);
+   CacheReader r;
+   EXPECT_EQ(r.Attach(old, kCacheQuickOpen), KEL_STATUS_CACHE_VERSION);
+}
+
+// Every entry is found through the slot table, and the entries come back
+// in key order whatever slots they hash to.
+TEST(CacheReader, EntriesInKeyOrder) {
+   CacheWriter w;
+   for (uint64_t i = 0; i < 1000; i++) {
+      Key k = IntKey(i * 7919 % 1000);
+      w.Add(EncodeLookup(Op::Get, KEL_NODE_world_info, std::span(&k, 1)), 0, std::to_string(i));
+   }
+   std::string bytes = w.Finish(ToolSignature(), "x");
+   CacheReader r;
+   ASSERT_EQ(r.Attach(bytes, 0), KEL_STATUS_OK);
+   ASSERT_EQ(r.EntryCount(), 1000u);
+   std::string previous;
+   for (uint32_t i = 0; i < r.EntryCount(); i++) {
+      std::string_view key;
+      CacheHit hit;
+      ASSERT_TRUE(r.EntryAt(i, &key, &hit));
+      EXPECT_LT(previous, std::string(key));
+      previous = key;
+   }
+}
+
+// A pipe is read whole; a FIFO that nobody writes to ends at once.
+TEST(CacheReader, PipesAreReadWhole) {
+   std::string fifo = TempPath("fifo");
+   unlink(fifo.c_str());
+   ASSERT_EQ(mkfifo(fifo.c_str(), 0600), 0);
+   auto start = std::chrono::steady_clock::now();
+   EXPECT_EQ(KEL_UseCache(fifo.c_str(), 0), KEL_STATUS_CACHE_EMPTY_PIPE);
+   EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(2));
+   unlink(fifo.c_str());
+
+   // Through /dev/fd/N of a pipe whose writer is this process: the whole
+   // file, then the end of the stream.
+   auto throughPipe = [](const std::string &bytes) {
+      int fds[2];
+      EXPECT_EQ(pipe(fds), 0);
+      pid_t child = fork();
+      if (child == 0) {
+         close(fds[0]);
+         for (size_t at = 0; at < bytes.size();) {
+            ssize_t n = write(fds[1], bytes.data() + at, std::min<size_t>(bytes.size() - at, 100));
+            if (n <= 0) _exit(1);
+            at += size_t(n);
+         }
+         _exit(0);
+      }
+      close(fds[1]);
+      std::string path = "/dev/fd/" + std::to_string(fds[0]);
+      KEL_Status status = KEL_UseCache(path.c_str(), 0);
+      close(fds[0]);
+      int wstatus;
+      waitpid(child, &wstatus, 0);
+      return status;
+   };
+   EXPECT_EQ(throughPipe(SmallCache()), KEL_STATUS_OK);
+   char name[8];
+   List keys = Keys({1});
+   EXPECT_EQ(KEL_Get(KEL_NODE_world_name, keys.get(), name, sizeof name), KEL_STATUS_OK);
+   EXPECT_STREQ(name, "idle0");
+   std::string cut = SmallCache();
+   EXPECT_EQ(throughPipe(cut.substr(0, cut.size() - 1)), KEL_STATUS_CACHE_TRUNCATED);
+   EXPECT_EQ(throughPipe(cut + "x"), KEL_STATUS_CACHE_CORRUPT);
+   EXPECT_EQ(throughPipe("{\"tree\": {}}"), KEL_STATUS_CACHE_JSON);
+   // A header claiming more than 32-bit offsets reach: refused from the header.
+   std::string huge = SmallCache();
+   StoreU64(reinterpret_cast<uint8_t *>(huge.data()) + 64, uint64_t(1) << 32);
+   EXPECT_EQ(throughPipe(huge), KEL_STATUS_CACHE_CORRUPT);
+}
+
+// Texts of a list live in chunks that never move: a text read early stays
+// valid while thousands more are appended, and removing the last entries
+// gives their room back for the next ones.
+TEST(ParamListTexts, StayInPlaceAcrossGrowth) {
+   List l(KEL_ParamListCreate(1, 1));
+   ASSERT_EQ(KEL_ParamListAddString(l.get(), "first"), KEL_STATUS_OK);
+   const char *first = KEL_ParamGetString(KEL_ParamListGetParam(l.get(), 0));
+   std::string big(5000, 'b');  // larger than a chunk
+   for (int i = 0; i < 5000; i++)
+      ASSERT_EQ(KEL_ParamListAddString(l.get(), i == 2500 ? big.c_str() : std::to_string(i).c_str()), KEL_STATUS_OK);
+   EXPECT_STREQ(first, "first");
+   EXPECT_EQ(KEL_ParamGetString(KEL_ParamListGetParam(l.get(), 2501)), big);
+   EXPECT_STREQ(KEL_ParamGetString(KEL_ParamListGetParam(l.get(), 5000)), "4999");
+   for (int i = 0; i < 10; i++) KEL_ParamListRemoveLastParam(l.get());
+   ASSERT_EQ(KEL_ParamListAddString(l.get(), "again"), KEL_STATUS_OK);
+   EXPECT_STREQ(KEL_ParamGetString(KEL_ParamListGetParam(l.get(), 4991)), "again");
+   EXPECT_STREQ(KEL_ParamGetString(KEL_ParamListGetParam(l.get(), 4990)), "4989");
+   EXPECT_STREQ(first, "first");
+   // A walk's key list: the same text key added and removed over and over
+   // takes no more room.
+   List keys(KEL_ParamListCreate(1, 1));
+   KEL_ParamListAddInt(keys.get(), 1);
+   for (int i = 0; i < 100000; i++) {
+      ASSERT_EQ(KEL_ParamListAddString(keys.get(), "boot.cfg"), KEL_STATUS_OK);
+      KEL_ParamListRemoveLastParam(keys.get());
+   }
+   EXPECT_LE(keys->chunks.size(), 1u);
 }

@@ -5,6 +5,8 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <algorithm>
+#include <array>
 #include <cerrno>
 #include <cstdio>
 #include <cstring>
@@ -18,6 +20,12 @@
 #include "kel/kel.h"
 #include "nodetable.h"
 #include "snapshot.h"
+
+#ifdef ORXKEL_VERSION
+#define ORXKEL_VERSION_TEXT ORXKEL_VERSION
+#else
+#define ORXKEL_VERSION_TEXT "1.0.0"
+#endif
 
 namespace {
 
@@ -34,6 +42,9 @@ struct Command {
 int Build(Args args);
 int Dump(Args args);
 int Capture(Args args);
+int Verify(Args args);
+int Info(Args args);
+int Version(Args args);
 int ToolBuildDate(Args args);
 int ToolSignature(Args args);
 int Help(Args args);
@@ -42,6 +53,9 @@ constexpr Command kCommands[] = {
    {"build", "build SNAPSHOT.json -o FILE", "make a cache file from a snapshot", Build},
    {"dump", "dump FILE", "write a cache file as a snapshot", Dump},
    {"capture", "capture [-o FILE] [--json]", "this Linux machine as a cache file or snapshot", Capture},
+   {"verify", "verify FILE", "check every byte of a cache file", Verify},
+   {"info", "info FILE", "what a cache file holds, and for which build", Info},
+   {"--version", "--version", "version, tree signature and build date", Version},
    {"--tool-build-date", "--tool-build-date", "the build date the tools carry", ToolBuildDate},
    {"--tool-signature", "--tool-signature", "the tree signature the tools expect", ToolSignature},
    {"--help|-h|help", "--help", "", Help},
@@ -204,23 +218,24 @@ int Build(Args args) {
    return 0;
 }
 
+// Opens a cache file for a subcommand; false after the message.
+bool OpenCache(const char *path, int flags, kelplat::CacheReader *reader) {
+   KEL_Status status = reader->Open(path, flags);
+   if (status == KEL_STATUS_OK) return true;
+   std::string detail;
+   if (status == KEL_STATUS_CACHE_OPEN) detail = std::string(" (") + std::strerror(errno) + ")";
+   std::fprintf(stderr, "kelcache: %s: %s%s\n", path, ORX_ReturnStatusToString(status), detail.c_str());
+   return false;
+}
+
 int Dump(Args args) {
    if (args.size() != 1) return Usage("dump needs exactly one cache file");
    const char *path = args[0];
    // The reader maps the file and checks its header before anything else,
    // so a hostile size is refused at once instead of read into memory.
+   // The dump verifies the whole file itself.
    kelplat::CacheReader reader;
-   KEL_Status status = reader.Open(path, 0);
-   if (status != KEL_STATUS_OK) {
-      std::string detail;
-      struct stat st;
-      if (status == KEL_STATUS_CACHE_OPEN)
-         detail = stat(path, &st) != 0     ? std::string(" (") + std::strerror(errno) + ")"
-                  : !S_ISREG(st.st_mode) ? " (not a regular file)"
-                                          : "";
-      std::fprintf(stderr, "kelcache: %s: %s%s\n", path, ORX_ReturnStatusToString(status), detail.c_str());
-      return 1;
-   }
+   if (!OpenCache(path, kelplat::kCacheQuickOpen, &reader)) return 1;
    std::string json, error;
    if (!DumpCache(reader.Bytes(), &json, &error)) {
       std::fprintf(stderr, "kelcache: %s: %s\n", path, error.c_str());
@@ -231,6 +246,70 @@ int Dump(Args args) {
 }
 
 int Capture(Args args) { return RunCapture(args, WriteCacheFile); }
+
+int Verify(Args args) {
+   if (args.size() != 1) return Usage("verify needs exactly one cache file");
+   kelplat::CacheReader reader;
+   if (!OpenCache(args[0], 0, &reader)) return 1;
+   std::printf("%s: OK, %u entries, %zu bytes\n", args[0], reader.EntryCount(), reader.Bytes().size());
+   return Flushed();
+}
+
+void PrintSignature(std::span<const uint8_t, 16> signature) {
+   for (uint8_t b : signature) std::printf("%02x", b);
+}
+
+// What a cache holds: its header, and per node how many entries of each
+// operation, from the slot table alone (no full verification).
+int Info(Args args) {
+   if (args.size() != 1) return Usage("info needs exactly one cache file");
+   kelplat::CacheReader reader;
+   if (!OpenCache(args[0], kelplat::kCacheQuickOpen, &reader)) return 1;
+   constexpr std::string_view kOps = "LGSDM";
+   std::span<const kelplat::NodeInfo> nodes = kelplat::Nodes();
+   // One row per node number (0: settings stored with the tree), one column per operation.
+   std::vector<std::array<uint32_t, 5>> counts(nodes.size() + 1);
+   uint32_t other = 0;
+   for (uint32_t i = 0; i < reader.SlotCount(); i++) {
+      std::string_view key;
+      kelplat::CacheHit hit;
+      uint32_t tag;
+      if (!reader.SlotAt(i, &key, &hit, &tag)) continue;
+      size_t op = key.size() >= 3 ? kOps.find(key[0]) : std::string_view::npos;
+      unsigned node = key.size() >= 3 ? uint8_t(key[1]) | unsigned(uint8_t(key[2])) << 8 : 0;
+      if (op == std::string_view::npos || node >= counts.size())
+         other++;
+      else
+         counts[node][op]++;
+   }
+   bool matches = std::equal(reader.Signature().begin(), reader.Signature().end(),
+                             kelplat::ToolSignature().begin());
+   std::printf("file:        %s\n", args[0]);
+   std::printf("signature:   ");
+   PrintSignature(reader.Signature());
+   std::printf("%s\n", matches ? " (matches this build)" : " (does not match this build)");
+   std::printf("build date:  %s\n", reader.BuildDate().c_str());
+   std::printf("size:        %zu bytes\n", reader.Bytes().size());
+   std::printf("entries:     %u\n", reader.EntryCount());
+   std::printf("%-40s %9s %9s %9s %9s\n", "node", "listings", "reads", "sets", "data");
+   for (size_t n = 0; n < counts.size(); n++) {
+      const std::array<uint32_t, 5> &c = counts[n];
+      if (c[0] + c[1] + c[2] + c[3] + c[4] == 0) continue;
+      std::string name = n == 0 ? "(settings)" : std::string(nodes[n - 1].name);
+      std::printf("%-40s %9u %9u %9u %9u\n", name.c_str(), c[0], c[1] + c[4], c[2], c[3]);
+   }
+   if (other > 0) std::printf("%-40s %9u\n", "(other keys)", other);
+   return Flushed();
+}
+
+int Version(Args args) {
+   if (!args.empty()) return Usage("--version takes no arguments");
+   std::printf("kelcache %s\n", ORXKEL_VERSION_TEXT);
+   std::printf("tree signature: ");
+   PrintSignature(kelplat::ToolSignature());
+   std::printf("\nbuild date: %s\n", kelplat::ToolBuildDate());
+   return Flushed();
+}
 
 int ToolBuildDate(Args args) {
    if (!args.empty()) return Usage("--tool-build-date takes no arguments");

@@ -277,7 +277,6 @@ bool ReadChildren(CartelChildren &seen, uint32_t cartel) {
    }
    ParamListPtr children;
    KEL_Status listStatus = GetInstanceList(KEL_NODE_userworld_cartel_child, childKeys.get(), &children);
-   childKeys.reset();
 
    uint32_t count = listStatus == KEL_STATUS_OK ? KEL_ParamListUsedCount(children.get()) : 0;
    if (!GrowArray(&seen.entries, &seen.entryRoom, size_t(seen.entryCount) + 1) ||
@@ -290,21 +289,15 @@ bool ReadChildren(CartelChildren &seen, uint32_t cartel) {
          std::fputs("failed to get child ID\n", stderr);
          return false;
       }
-      ParamListPtr keys(KEL_ParamListCreate(1, 1));
-      if (!keys) {
-         std::fputs("failed to create children list\n", stderr);
-         return false;
-      }
-      if (KEL_ParamListAddInt(keys.get(), cartel) != KEL_STATUS_OK) {
-         std::fputs("failed to add cartel ID to list\n", stderr);
-         return false;
-      }
-      if (KEL_ParamListAddInt(keys.get(), uint64_t(int64_t(childId))) != KEL_STATUS_OK) {
+      // The listing's key list, with the child's key for as long as its
+      // record is read: no list per child.
+      ScopedKey childKey(childKeys.get(), uint64_t(int64_t(childId)));
+      if (!childKey.ok()) {
          std::fputs("failed to add child ID to list\n", stderr);
          return false;
       }
       uint8_t child[cartelchild::kSize];
-      KEL_Status status = KEL_Get(KEL_NODE_userworld_cartel_child, keys.get(), child, sizeof child);
+      KEL_Status status = KEL_Get(KEL_NODE_userworld_cartel_child, childKeys.get(), child, sizeof child);
       if (status != KEL_STATUS_OK) {
          std::fprintf(stderr, "failed to get child info for child %d, status %s\n", childId,
                       ORX_ReturnStatusToString(status));
