@@ -53,6 +53,10 @@ std::optional<std::string_view> TreeMeta(std::string_view name);
 const char *SimulatorPath();
 // Whether the calls run against the simulator.
 bool InSimulator();
+// How many lookups the tree has answered in this process: lets tests show
+// that a command reads each entry once, however the cache is laid out.
+uint64_t TreeLookupCount();
+
 }  // namespace kelplat
 
 #endif

@@ -116,8 +116,13 @@ std::span<const uint8_t, 16> ToolSignature() { return std::span<const uint8_t, 1
 
 const char *ToolBuildDate() { return ORXKEL_BUILD_DATE; }
 
+static uint64_t gLookups = 0;
+
+uint64_t TreeLookupCount() { return gLookups; }
+
 static bool TreeLookup(Op op, KEL_Node node, const KEL_ParamList *keys, CacheHit *hit, KEL_Status *status) {
    Tree &t = TheTree();
+   gLookups++;
    if (!t.loaded) {
       *status = KEL_STATUS_NO_TREE;
       return false;
