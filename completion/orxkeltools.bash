@@ -139,7 +139,7 @@ _kelcache() {
     COMPREPLY=()
 
     if ((cword == 1)); then
-        mapfile -t COMPREPLY < <(compgen -W "build dump verify info --version --tool-build-date --tool-signature --help" -- "$cur")
+        mapfile -t COMPREPLY < <(compgen -W "build dump capture verify info --version --tool-build-date --tool-signature --help" -- "$cur")
         return 0
     fi
     case ${COMP_WORDS[1]} in
@@ -150,6 +150,12 @@ _kelcache() {
             mapfile -t COMPREPLY < <(compgen -W "-o" -- "$cur")
         else
             _orxkeltools_files "$cur" .json
+        fi ;;
+    capture)
+        if [[ $prev == -o ]]; then
+            _orxkeltools_files "$cur" .cache
+        else
+            mapfile -t COMPREPLY < <(compgen -W "-o --json" -- "$cur")
         fi ;;
     dump | verify | info)
         ((cword == 2)) && _orxkeltools_files "$cur" .cache ;;
