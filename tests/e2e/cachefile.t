@@ -86,6 +86,12 @@ exe: kelcache
 argv: kelcache build @CACHE.json -o out.cache
 check: cmp -s out.cache @CACHE && [ -z "$(ls -A | grep '^\.kelcache')" ]
 exit: 0
+=== case kelcache build - reads the snapshot from standard input
+snapshot: tiny
+exe: /bin/sh
+argv: sh -c 'cat @CACHE.json | @BIN/kelcache build - -o piped.cache'
+check: cmp -s piped.cache @CACHE
+exit: 0
 === case a 4 GiB sparse cache file with a valid header is refused at once
 snapshot: tiny
 mode: plain

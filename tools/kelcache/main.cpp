@@ -50,7 +50,7 @@ int ToolSignature(Args args);
 int Help(Args args);
 
 constexpr Command kCommands[] = {
-   {"build", "build SNAPSHOT.json -o FILE", "make a cache file from a snapshot", Build},
+   {"build", "build SNAPSHOT.json -o FILE", "make a cache file from a snapshot (- reads stdin)", Build},
    {"dump", "dump FILE", "write a cache file as a snapshot", Dump},
    {"capture", "capture [-o FILE] [--json]", "this Linux machine as a cache file or snapshot", Capture},
    {"verify", "verify FILE", "check every byte of a cache file", Verify},
@@ -131,6 +131,23 @@ bool ReadRegularFile(const char *path, std::string *bytes, std::string *problem)
    return ok;
 }
 
+// The whole of standard input ("kelcache build -"), whatever it is: a pipe,
+// a file or a terminal.
+bool ReadStandardInput(std::string *bytes, std::string *problem) {
+   bytes->clear();
+   char chunk[65536];
+   for (;;) {
+      ssize_t n = read(STDIN_FILENO, chunk, sizeof chunk);
+      if (n < 0 && errno == EINTR) continue;
+      if (n < 0) {
+         *problem = std::strerror(errno);
+         return false;
+      }
+      if (n == 0) return true;
+      bytes->append(chunk, size_t(n));
+   }
+}
+
 bool WriteAll(int fd, const std::string &bytes) {
    for (size_t done = 0; done < bytes.size();) {
       ssize_t n = write(fd, bytes.data() + done, bytes.size() - done);
@@ -194,7 +211,7 @@ int Build(Args args) {
          if (i + 1 == args.size()) return Usage("-o needs a file name");
          output = args[++i];
          haveOutput = true;
-      } else if (input.empty() && !word.empty() && word[0] != '-') {
+      } else if (input.empty() && !word.empty() && (word[0] != '-' || word == "-")) {
          input = word;
       } else {
          return Usage("unexpected argument '" + std::string(word) + "'");
@@ -203,8 +220,9 @@ int Build(Args args) {
    if (input.empty() || !haveOutput) return Usage("build needs a snapshot and -o FILE");
 
    std::string json, bytes, problem;
-   if (!ReadRegularFile(input.c_str(), &json, &problem)) {
-      std::fprintf(stderr, "kelcache: %s: %s\n", input.c_str(), problem.c_str());
+   bool read = input == "-" ? ReadStandardInput(&json, &problem) : ReadRegularFile(input.c_str(), &json, &problem);
+   if (!read) {
+      std::fprintf(stderr, "kelcache: %s: %s\n", input == "-" ? "standard input" : input.c_str(), problem.c_str());
       return 1;
    }
    if (!BuildCache(json, &bytes, &problem)) {
