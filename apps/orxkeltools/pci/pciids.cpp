@@ -1,12 +1,12 @@
 // The PCI ID database.
 //
 // The ID files are the ".ids" files of five override folders, in a fixed
-// order, then pci.ids, read as one stream of lines.  The rules that define
-// the tables describe two readings of that stream: one that counts the
-// device rows (up to the "ffff" line that ends the vendor section) and the
-// class rows (after it), and one that fills the tables and reports the
-// first malformed line of each section.  Here the stream is read once, and
-// each line is handed to every reading it belongs to:
+// order, then pci.ids, read as one stream of lines.  The tables are those
+// two readings of that stream would make: one that counts the device rows
+// (up to the "ffff" line that ends the vendor section) and the class rows
+// (after it), and one that fills the tables and reports the first
+// malformed line of each section.  Here the stream is read once, and each
+// line is handed to every reading it belongs to:
 // - the counts and the filling of the device table run side by side up to
 //   the "ffff" line;
 // - the filling of the class table starts on the line after the one that
