@@ -170,7 +170,6 @@ public:
       return true;
    }
 
-   int Count() const { return count_; }
    const T &operator[](int index) const { return rows_[index]; }
 
 private:
