@@ -1,11 +1,21 @@
 #!/bin/sh
 # Times orxkeltools' lspci beside pciutils' lspci on this machine.
 #
-# lspci, lspci -v and lspci -p run on the example host's cache and on a
-# generated cache of 300 PCI functions; pciutils' lspci, lspci -v and
-# lspci -nk (IDs and kernel modules, the job nearest to -p) run on the
-# machine's own devices.  Both tools read the full /usr/share/hwdata/pci.ids.
-# Uses hyperfine when it is installed, else a timed loop.
+# lspci, lspci -v, lspci -n and lspci -p run on the example host's cache and
+# on a generated cache of 300 PCI functions; pciutils' lspci, lspci -v,
+# lspci -n and lspci -nk (IDs and kernel modules, the job nearest to -p) run
+# on the machine's own devices.  Both tools read the full
+# /usr/share/hwdata/pci.ids.
+#
+# The floor is what no lspci can go below: a small static C program that
+# starts, maps pci.ids and finds each of its lines once.  Beside it stands
+# our own start-up: halvex -v on the example host's cache.
+#
+# Times are the mean and, in brackets, the fastest run: on a busy machine
+# the fastest runs are the steadier figure.  Uses hyperfine when it is
+# installed, else a timed loop (mean only).  With valgrind installed, the
+# instruction counts of the example host's runs and of the floor follow;
+# they do not depend on the machine's load.
 #
 #   bench/lspci_bench.sh [BUILD_DIR] [RUNS]     (defaults: build, 100)
 set -eu
@@ -56,12 +66,39 @@ json.dump(snapshot, open(sys.argv[1], "w"))
 EOF
 "$build/bin/kelcache" build "$work/host300.json" -o "$work/host300.cache"
 
-# Mean wall time of one run of a command, in milliseconds.
+# The floor: map pci.ids and find each line once.  Static, as orxkeltools
+# is, when the C library allows it.
+cat > "$work/floor.c" <<'EOF'
+#include <fcntl.h>
+#include <stdio.h>
+#include <string.h>
+#include <sys/mman.h>
+#include <sys/stat.h>
+#include <unistd.h>
+int main(void) {
+   int fd = open("/usr/share/hwdata/pci.ids", O_RDONLY);
+   struct stat st;
+   if (fd < 0 || fstat(fd, &st) != 0) return 1;
+   const char *p = mmap(NULL, st.st_size, PROT_READ, MAP_PRIVATE | MAP_POPULATE, fd, 0);
+   if (p == MAP_FAILED) return 1;
+   const char *end = p + st.st_size;
+   long lines = 0;
+   for (const char *q = p; q < end; lines++) {
+      const char *newline = memchr(q, '\n', end - q);
+      q = newline ? newline + 1 : end;
+   }
+   printf("%ld\n", lines);
+   return 0;
+}
+EOF
+cc -O2 -static -o "$work/floor" "$work/floor.c" 2>/dev/null || cc -O2 -o "$work/floor" "$work/floor.c"
+
+# Wall time of one run of a command in milliseconds: "mean (fastest)".
 time_ms() {
    if command -v hyperfine >/dev/null 2>&1; then
       hyperfine -N --style none --warmup 5 --runs "$runs" --export-json "$work/t.json" "$1" >/dev/null 2>&1
-      python3 -c 'import json, sys; print("%.2f" % (json.load(open(sys.argv[1]))["results"][0]["mean"] * 1000))' \
-         "$work/t.json"
+      python3 -c 'import json, sys; r = json.load(open(sys.argv[1]))["results"][0]
+print("%.2f (%.2f)" % (r["mean"] * 1000, r["min"] * 1000))' "$work/t.json"
    else
       start=$(date +%s%N)
       i=0
@@ -74,23 +111,49 @@ time_ms() {
    fi
 }
 
-report() {  # case, our time, reference command, its time
-   printf '%-20s %9s ms   %-10s %9s ms %7s\n' "$1" "$2" "$3" "$4" "$(echo "$2 $4" | awk '{ printf "%.2f", $1 / $2 }')"
+# case, our time, reference, its time: the ratio of the means and, in
+# brackets, of the fastest runs.
+report() {
+   printf '%-20s %17s ms   %-12s %17s ms %13s\n' "$1" "$2" "$3" "$4" \
+      "$(echo "$2 $4" | tr -d '()' | awk '{ if (NF == 4) printf "%.2f (%.2f)", $1 / $3, $2 / $4; else printf "%.2f", $1 / $2 }')"
 }
 
 ref_plain=$(time_ms "$reference")
 ref_v=$(time_ms "$reference -v")
+ref_n=$(time_ms "$reference -n")
 ref_nk=$(time_ms "$reference -nk")
+floor=$(time_ms "$work/floor")
+startup=$(time_ms "$tool -c $example halvex -v")
 
-printf '%-20s %12s   %-10s %12s %7s\n' "orxkeltools" "" "pciutils" "" "ratio"
+printf '%-20s %20s   %-12s %20s %13s\n' "orxkeltools" "" "reference" "" "ratio"
 for cache in example host300; do
    if [ "$cache" = example ]; then file=$example; else file=$work/host300.cache; fi
    ours=$(time_ms "$tool -c $file lspci")
    report "lspci ($cache)" "$ours" "lspci" "$ref_plain"
+   if [ "$cache" = example ]; then
+      report "lspci ($cache)" "$ours" "floor" "$floor"
+      report "lspci ($cache)" "$ours" "halvex -v" "$startup"
+   fi
    ours=$(time_ms "$tool -c $file lspci -v")
    report "lspci -v ($cache)" "$ours" "lspci -v" "$ref_v"
+   ours=$(time_ms "$tool -c $file lspci -n")
+   report "lspci -n ($cache)" "$ours" "lspci -n" "$ref_n"
    # -p shows no names but loads them all the same; pciutils' -nk skips them.
    ours=$(time_ms "$tool -c $file lspci -p")
    report "lspci -p ($cache)" "$ours" "lspci -nk" "$ref_nk"
    report "" "$ours" "lspci" "$ref_plain"
 done
+report "floor" "$floor" "halvex -v" "$startup"
+
+# Instructions, which a busy machine does not change.
+if command -v valgrind >/dev/null 2>&1; then
+   count() {
+      valgrind --tool=callgrind --callgrind-out-file=/dev/null "$@" 2>&1 >/dev/null |
+         sed -n 's/.*Collected : *\([0-9]*\).*/\1/p'
+   }
+   printf '\n%-36s %14s\n' "instructions (callgrind)" ""
+   printf '%-36s %14s\n' "lspci (example)" "$(count "$tool" -c "$example" lspci)"
+   printf '%-36s %14s\n' "lspci -n (example)" "$(count "$tool" -c "$example" lspci -n)"
+   printf '%-36s %14s\n' "halvex -v (example)" "$(count "$tool" -c "$example" halvex -v)"
+   printf '%-36s %14s\n' "floor" "$(count "$work/floor")"
+fi

@@ -6,6 +6,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <random>
 #include <string>
 #include <thread>
 
@@ -271,8 +272,7 @@ TEST_F(PciIds, LongLinesArriveInPieces) {
 
 TEST_F(PciIds, LongLinesAcrossReadChunks) {
    // 1000 lines of 301 bytes: a device line cut after 255 bytes, and its
-   // continuation, a comment.  The file spans several read chunks, so lines
-   // and pieces straddle their seams.
+   // continuation, a comment.
    std::string ids = "1af4  Red Hat, Inc.\n";
    for (int i = 0; i < 1000; i++) {
       char id[8];
@@ -285,6 +285,101 @@ TEST_F(PciIds, LongLinesAcrossReadChunks) {
    EXPECT_EQ(PciDevCount(), 1001);
    for (int i : {0, 217, 218, 435, 999})
       EXPECT_EQ(Names(0x1af4, uint16_t(i)), "Red Hat, Inc.|" + std::string(127, char('a' + i % 26))) << i;
+}
+
+TEST_F(PciIds, ANulEndsItsLine) {
+   // What follows a NUL up to the end of the line is never seen; a file may
+   // end without a newline.
+   Write("pci.ids", std::string("1af4  Red\0 Hat\n\t0001  Dev\0ice\n\t0002  Last", 41));
+   EXPECT_EQ(Load(), "no class entries in " + root_ + "/pci.ids\nPerhaps, corrupted file?\n");
+   EXPECT_EQ(Names(0x1af4, 0x0001), "Red|Dev");
+   EXPECT_EQ(Names(0x1af4, 0x0002), "Red|Last");
+}
+
+TEST_F(PciIds, ReportsOfTheFillingFollowTheCountWarnings) {
+   // The malformed vendor line makes no row, so the build succeeds; its
+   // report still comes after the warning about the missing classes.
+   Write("pci.ids", "1af4  Red Hat, Inc.\nzz\n");
+   EXPECT_EQ(Load(), "no class entries in " + root_ + "/pci.ids\nPerhaps, corrupted file?\n" + root_ +
+                        "/pci.ids: line 2 improperly formatted(1)\n");
+   EXPECT_EQ(PciDevCount(), 1);
+   // Once the device rows fall short, the class section is not reported on.
+   Write("pci.ids", "1af4  Red Hat, Inc.\n\t\t1af4 zz01  Bad\n\t0001  After\nffff  Illegal\nC zz  Bad class\n");
+   EXPECT_EQ(Load(), root_ + "/pci.ids: line 2 improperly formatted(4)\n"
+                             "parsing problem: devices 1 ndevid 3\n"
+                             "Failed to build PCI tables\n");
+}
+
+TEST_F(PciIds, ClassRowsStartAfterTheLineThatEndedTheDeviceRows) {
+   // A malformed vendor line that makes no row ends the device rows early;
+   // the class rows start on the next line, so three-tab lines of the
+   // vendor section become prog-if rows and the "ffff" line closes no block.
+   const std::string head = "1af4  Red Hat, Inc.\n\t1041  Virtio\nzz bad\n";
+   Write("pci.ids", head + "\t\t\t01  Three tabs\nffff  Illegal\nC 02  Network\n\t00  Ethernet\n");
+   EXPECT_EQ(Load(), root_ + "/pci.ids: line 3 improperly formatted(1)\n"
+                             "internal error: classes 3 nclass 2\n"
+                             "Failed to build PCI tables\n");
+   // Two such rows, and a comment that loses two more in the class section,
+   // make the counts agree: the build succeeds with those rows.
+   Write("pci.ids", head + "\t\t\t01  First\n\t\t\t02  Second\nffff  Illegal\nC 02  Network\n\t00  Ethernet\n"
+                           "# note\nC 03  Display\n");
+   EXPECT_EQ(Load(), root_ + "/pci.ids: line 3 improperly formatted(1)\n");
+   ASSERT_EQ(PciClassCount(), 3);
+   EXPECT_EQ(PciClassRow(1).progIf, 2);
+   EXPECT_EQ(PciName(PciClassRow(1).progIfName), "Second");
+   EXPECT_EQ(ClassNames(0x0200), "none");
+   EXPECT_EQ(ClassNames(0x0300), "Display|");
+   EXPECT_EQ(Names(0x1af4, 0x1041), "Red Hat, Inc.|Virtio");
+}
+
+TEST_F(PciIds, IndexAnswersAsTheScanOnGeneratedTables) {
+   // Tables of a few thousand rows over few vendors and devices, so that
+   // each pair comes in several runs, in several files, among rows from
+   // override files and pci.ids, real and synthesized names, and subsystem
+   // rows that do and do not match.  Every lookup is compared with the
+   // plain scan of the table in file order.
+   std::mt19937 random(14);
+   auto pick = [&](int n) { return int(random() % unsigned(n)); };
+   auto hex4 = [](int v) {
+      char id[8];
+      std::snprintf(id, sizeof id, "%04x", v);
+      return std::string(id);
+   };
+   auto idFile = [&](int lines, bool vendorRows) {
+      std::string text;
+      for (int i = 0; i < lines; i++) {
+         int kind = pick(10);
+         if (kind == 0 || i == 0)
+            text += hex4(0x1000 + pick(4)) + "  Vendor " + std::to_string(pick(100)) + "\n";
+         else if (kind < 4)
+            text += "\t" + hex4(pick(6)) + (pick(4) == 0 ? std::string("\n") : "  Device " + std::to_string(i) + "\n");
+         else if (vendorRows || kind < 9)
+            text += "\t\t" + hex4(0x1000 + pick(3)) + " " + hex4(pick(3)) + "  Sub " + std::to_string(i) + "\n";
+      }
+      return text;
+   };
+   for (int round = 0; round < 4; round++) {
+      SCOPED_TRACE(round);
+      std::filesystem::remove_all(root_);
+      Write("pci.ids", idFile(3000, true) + kClasses);
+      if (round > 0) Write("oem.pciids.d/a.ids", idFile(300 * round, false));
+      if (round > 1) Write("fallback.pciids.d/b.ids", idFile(500, false));
+      ASSERT_EQ(Load(), "");
+      ASSERT_GT(PciDevCount(), 2048);  // more than one chunk of rows
+      for (int vendor = 0x1000; vendor < 0x1005; vendor++) {
+         for (int device = 0; device < 7; device++) {
+            for (int sub = 0; sub < 12; sub++) {
+               uint16_t subvendor = sub < 9 ? uint16_t(0x1000 + sub / 3) : 0;
+               uint16_t subdevice = uint16_t(sub % 3);
+               ASSERT_EQ(LookupPciDevice(uint16_t(vendor), uint16_t(device), subvendor, subdevice),
+                         LookupPciDeviceByScan(uint16_t(vendor), uint16_t(device), subvendor, subdevice))
+                  << vendor << " " << device << " " << sub;
+            }
+         }
+         ASSERT_EQ(LookupPciDevice(uint16_t(vendor), 0xffff, 0xffff, 0xffff),
+                   LookupPciDeviceByScan(uint16_t(vendor), 0xffff, 0xffff, 0xffff));
+      }
+   }
 }
 
 TEST_F(PciIds, AFileThatCannotBeMappedIsReadIntoMemory) {

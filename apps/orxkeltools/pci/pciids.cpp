@@ -1,23 +1,34 @@
 // The PCI ID database.
 //
 // The ID files are the ".ids" files of five override folders, in a fixed
-// order, then pci.ids, read as one stream of lines.  The stream is read
-// twice: first to count the device rows (up to the "ffff" line that ends
-// the vendor section) and the class rows (after it), then to fill the two
-// tables, each allocated once at its exact size.  Rows made from the
-// override folders come first, and the lookups let them win over pci.ids.
+// order, then pci.ids, read as one stream of lines.  The tables are those
+// two readings of that stream would make: one that counts the device rows
+// (up to the "ffff" line that ends the vendor section) and the class rows
+// (after it), and one that fills the tables and reports the first
+// malformed line of each section.  Here the stream is read once, and each
+// line is handed to every reading it belongs to:
+// - the counts and the filling of the device table run side by side up to
+//   the "ffff" line;
+// - the filling of the class table starts on the line after the one that
+//   ended the device filling, which is the "ffff" line unless a malformed
+//   line ended it sooner;
+// - the reports of the filling are kept back and printed after the count
+//   warnings, in the order two readings would print them.
+// Rows made from the override folders come first, and the lookups let them
+// win over pci.ids.
 //
 // Memory is laid out for a run that reads a 1.4 MB pci.ids and then names a
 // few hundred functions, on machines where the first touch of a page costs
 // microseconds:
-// - Both readings go through one small buffer.  Each file is also mapped,
-//   and rows refer to their names by offset into the files taken end to
-//   end, so a name is copied nowhere and only the pages of names actually
-//   printed are ever touched.
-// - Rows are 24 bytes, in memory whose pages are mapped by one call.
+// - Each file is mapped with its pages and read in place; rows refer to
+//   their names by offset into the files taken end to end, so a name is
+//   copied nowhere.
+// - Device rows are 20 bytes, in one mapping whose pages are all mapped by
+//   one call, at a size guessed from the bytes of the files.
 // - Device lookups go through an index from (vendor, device) to that pair's
 //   rows in table order, built at the first lookup; it answers exactly as a
 //   scan of the whole table would.
+// - The process ends without unmapping any of it.
 #include "pci/pciids.h"
 
 #include <dirent.h>
@@ -26,7 +37,9 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <array>
 #include <cerrno>
+#include <cstdarg>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -54,10 +67,37 @@ constexpr size_t kMaxPathBuf = 4097;
 constexpr size_t kVendorNameCap = 64;
 constexpr size_t kDeviceNameCap = 128;
 constexpr size_t kClassNameCap = 64;
+// Room for a report: a path of at most 255 characters and a short text.
+constexpr size_t kReportSize = 512;
+// Bytes of ID files per device row, a little under what pci.ids has, so
+// that the device table taken at the start nearly always holds every row.
+constexpr size_t kBytesPerRowGuess = 36;
 
 // PciText flags.
 constexpr uint8_t kMadeUp = 1;     // in the store of synthesized names, not in a file
 constexpr uint8_t kNotAvail = 2;   // begins with not_avail_prefix
+
+// The value of each hexadecimal digit; kNotHex for every other byte.
+constexpr uint8_t kNotHex = 0xff;
+constexpr std::array<uint8_t, 256> kHexValue = [] {
+   std::array<uint8_t, 256> table{};
+   for (int c = 0; c < 256; c++) {
+      if (c >= '0' && c <= '9')
+         table[c] = uint8_t(c - '0');
+      else if (c >= 'a' && c <= 'f')
+         table[c] = uint8_t(c - 'a' + 10);
+      else if (c >= 'A' && c <= 'F')
+         table[c] = uint8_t(c - 'A' + 10);
+      else
+         table[c] = kNotHex;
+   }
+   return table;
+}();
+
+uint8_t HexDigit(char c) { return kHexValue[static_cast<unsigned char>(c)]; }
+bool IsHexDigit(char c) { return HexDigit(c) != kNotHex; }
+bool IsBlank(char c) { return c == ' ' || c == '\t'; }
+char At(std::string_view s, size_t i) { return i < s.size() ? s[i] : '\0'; }
 
 // Memory mapped by MapZeroed or from a file; its owner unmaps it.
 struct Unmapper {
@@ -68,7 +108,7 @@ template <class T>
 using MappedArray = std::unique_ptr<T[], Unmapper>;
 
 // count zero-filled elements whose pages are all mapped by one call.
-// Taking them one page fault at a time costs several times as much on the
+// Taking them one page fault at a time costs about twice as much on the
 // machines measured.  A count of 0 gives an empty owner and counts as
 // success.
 template <class T>
@@ -82,6 +122,68 @@ bool MapZeroed(size_t count, MappedArray<T> *array) {
    *array = MappedArray<T>(static_cast<T *>(p), Unmapper{bytes});
    return true;
 }
+
+// A table that grows a row at a time while the ID files are read: its size
+// is known only at their end.  It is one mapping, sized before the reading
+// from the bytes to be read and mapped with its pages in one call.  Should
+// the rows outgrow it, the mapping moves to a larger one (its pages move
+// with it, nothing is copied) whose new pages are taken as they are
+// written.
+template <class T>
+class RowTable {
+public:
+   RowTable() = default;
+   RowTable(const RowTable &) = delete;
+   RowTable &operator=(const RowTable &) = delete;
+   RowTable &operator=(RowTable &&other) noexcept {
+      if (this != &other) {
+         Release();
+         rows_ = other.rows_;
+         capacity_ = other.capacity_;
+         count_ = other.count_;
+         other.rows_ = nullptr;
+         other.capacity_ = 0;
+         other.count_ = 0;
+      }
+      return *this;
+   }
+   ~RowTable() { Release(); }
+
+   // Room for count rows, zero-filled; false when there is no memory.
+   bool Reserve(size_t count) {
+      if (count <= capacity_) return true;
+      if (count > SIZE_MAX / sizeof(T)) return false;
+      void *p = rows_ == nullptr ? mmap(nullptr, count * sizeof(T), PROT_READ | PROT_WRITE,
+                                        MAP_PRIVATE | MAP_ANONYMOUS | MAP_POPULATE, -1, 0)
+                                 : mremap(rows_, capacity_ * sizeof(T), count * sizeof(T), MREMAP_MAYMOVE);
+      if (p == MAP_FAILED) return false;
+      rows_ = static_cast<T *>(p);
+      capacity_ = count;
+      return true;
+   }
+
+   // False (and nothing added) when there is no memory for it.
+   bool Append(const T &row) {
+      if (size_t(count_) == capacity_ && (count_ == INT32_MAX || !Reserve(capacity_ + capacity_ / 2 + 1024)))
+         return false;
+      rows_[count_++] = row;
+      return true;
+   }
+
+   const T &operator[](int index) const { return rows_[index]; }
+
+private:
+   void Release() {
+      if (rows_ != nullptr) munmap(rows_, capacity_ * sizeof(T));
+      rows_ = nullptr;
+      capacity_ = 0;
+      count_ = 0;
+   }
+
+   T *rows_ = nullptr;
+   size_t capacity_ = 0;
+   int count_ = 0;
+};
 
 // The bytes of one ID file for the tables' lifetime: mapped from the file,
 // or, for a file that cannot be mapped, read into memory.  Offsets of names
@@ -155,27 +257,36 @@ struct Tables {
    MallocPtr<char> madeUp;  // synthesized names
    size_t madeUpSize = 0;
    size_t madeUpCapacity = 0;
-   MappedArray<PciDevEntry> dev;
+   RowTable<PciDevEntry> dev;
    int ndevid = 0;
-   MappedArray<PciClassEntry> cls;
+   MallocPtr<PciClassEntry> cls;
+   size_t clsCapacity = 0;
    int nclass = 0;
    int lastOverrideIndex = -1;
    int keyRuns = 0;  // runs of rows with one (vendor, device): at least the number of pairs
-   // The device index: open addressing over (vendor, device), each slot
-   // holding the first row of its pair, and for each row the next row of
-   // the same pair in table order.  Both hold row + 1, so that 0 is none.
+   // The device index: open addressing over the runs, each slot holding the
+   // first row of a run + 1 (0 is an empty slot).
    bool indexTried = false;
    MappedArray<int32_t> slots;
    uint32_t slotCount = 0;  // a power of two
    int slotShift = 0;       // 32 - log2(slotCount): the hash keeps the top bits
-   MappedArray<int32_t> next;
 };
 
-Tables gIds;
+// The tables of the last load.  A new load drops those of the one before;
+// at the end of the process they are left to the kernel, which takes back a
+// process's memory at once: unmapping them one piece at a time costs more
+// than the whole load on the machines measured, since each call flushes the
+// address translations of every processor the process ran on.
+union TablesForLife {
+   TablesForLife() : tables() {}
+   ~TablesForLife() {}
+   Tables tables;
+};
+TablesForLife gLife;
+Tables &gIds = gLife.tables;
 
 void DropIndex() {
    gIds.slots.reset();
-   gIds.next.reset();
    gIds.slotCount = 0;
    gIds.indexTried = false;
 }
@@ -209,6 +320,62 @@ MallocPtr<char> ReadAll(int fd, size_t *size) {
    return bytes;
 }
 
+// The bytes of an ID file as the next source: -1 for a file that cannot be
+// opened or has no bytes, which gives no lines.  A regular file is mapped
+// with its pages, since every byte is read; anything else (a FIFO, say) is
+// read whole.  Names are later read from the mapping: package updates
+// replace ID files rather than rewrite them in place, so the mapping keeps
+// the bytes that were parsed.
+int OpenSource(const char *path) {
+   int fd = open(path, O_RDONLY | O_CLOEXEC);
+   if (fd < 0) return -1;
+   int index = -1;
+   struct stat st;
+   if (fstat(fd, &st) == 0 && S_ISREG(st.st_mode) && st.st_size > 0 && uint64_t(st.st_size) <= UINT32_MAX) {
+      size_t size = size_t(st.st_size);
+      void *map = mmap(nullptr, size, PROT_READ, MAP_PRIVATE | MAP_POPULATE, fd, 0);
+      if (map != MAP_FAILED) {
+         if (gIds.sources.Add(static_cast<const char *>(map), size, true, &index)) {
+            close(fd);
+            return index;
+         }
+         munmap(map, size);
+      }
+   }
+   size_t size;
+   MallocPtr<char> bytes = ReadAll(fd, &size);
+   close(fd);
+   if (size > 0 && gIds.sources.Add(bytes.get(), size, false, &index)) (void)bytes.release();
+   return index;
+}
+
+// The lines of one source, in pieces of at most kLinePiece bytes, each cut
+// at its first NUL as a C string would be.
+class LineReader {
+public:
+   explicit LineReader(const Source &s)
+      : at_(s.bytes), end_(s.bytes + s.size), nul_(static_cast<const char *>(std::memchr(s.bytes, '\0', s.size))) {}
+
+   bool Next(std::string_view *line) {
+      if (at_ == end_) return false;
+      const char *start = at_;
+      size_t n = size_t(end_ - at_) < kLinePiece ? size_t(end_ - at_) : kLinePiece;
+      if (const void *newline = std::memchr(start, '\n', n)) n = size_t(static_cast<const char *>(newline) - start) + 1;
+      at_ += n;
+      if (nul_ != nullptr && nul_ < at_) {
+         n = size_t(nul_ - start);
+         nul_ = static_cast<const char *>(std::memchr(at_, '\0', size_t(end_ - at_)));
+      }
+      *line = std::string_view(start, n);
+      return true;
+   }
+
+private:
+   const char *at_;
+   const char *end_;
+   const char *nul_;  // the first NUL from at_ on, if any
+};
+
 // The two problems that end lspci: both are reported here, and the load
 // then fails all the way up.
 bool CorruptedFileName() {
@@ -221,36 +388,21 @@ bool NoMemoryForFileList() {
    return false;
 }
 
-// One entry of the file list.  A file is opened when the cursor first
-// reaches it and stays open until the load ends, so that the second reading
-// sees the same file.  Names are later read from its mapping; package
-// updates replace ID files rather than rewrite them in place, so the
-// mapping keeps the bytes that were parsed.
+// One entry of the file list: its path, and its bytes once opened.
 struct IdFile {
    char *path;
-   bool opened;
-   int fd;      // -1 once the file is in memory, or when it cannot be opened
    int source;  // in gIds.sources; -1 when the file gives no bytes
 };
 
-// The ID files of one load in reading order, with a cursor over their lines.
+// The ID files of one load, in reading order.
 class FileList {
 public:
    FileList() = default;
    ~FileList() {
-      for (int i = 0; i < count_; i++) {
-         if (files_[i].fd >= 0) close(files_[i].fd);
-         std::free(files_[i].path);
-      }
+      for (int i = 0; i < count_; i++) std::free(files_[i].path);
    }
    FileList(const FileList &) = delete;
    FileList &operator=(const FileList &) = delete;
-
-   // Takes the read buffer; false after reporting that there is no memory.
-   bool Init() {
-      buffer_ = AllocArray<char>(kReadChunk);
-      return buffer_ ? true : NoMemoryForFileList();
-   }
 
    // False after reporting a path that is too long or no memory.
    bool Add(const char *path) {
@@ -260,7 +412,7 @@ public:
       char *copy = static_cast<char *>(std::malloc(len + 1));
       if (copy == nullptr) return NoMemoryForFileList();
       std::memcpy(copy, path, len + 1);
-      files_[count_++] = IdFile{copy, false, -1, -1};
+      files_[count_++] = IdFile{copy, -1};
       return true;
    }
 
@@ -282,170 +434,31 @@ public:
       return true;
    }
 
-   // The next line (piece) across all files, cut at its first NUL as a C
-   // string would be; false after the last file.  The text stays valid
-   // until the next call.
-   bool NextLine(std::string_view *line) {
-      while (current_ < count_) {
-         if (!started_ && !StartFile()) {
-            NextFile();
-            continue;
-         }
-         started_ = true;
-         if (length_ - pos_ < kLinePiece) Refill();
-         if (pos_ == length_) {
-            NextFile();
-            continue;
-         }
-         const char *p = data_ + pos_;
-         size_t n = length_ - pos_ < kLinePiece ? length_ - pos_ : kLinePiece;
-         if (const void *newline = std::memchr(p, '\n', n)) n = size_t(static_cast<const char *>(newline) - p) + 1;
-         pos_ += n;
-         lineNumber_++;
-         if (firstNul_ != nullptr && firstNul_ < p + n) {
-            size_t cut = size_t(static_cast<const char *>(std::memchr(p, '\0', n)) - p);
-            firstNul_ = static_cast<const char *>(std::memchr(data_ + pos_, '\0', length_ - pos_));
-            n = cut;
-         }
-         *line = std::string_view(p, n);
-         return true;
+   // Opens every file, in order; returns the number of bytes they hold.
+   size_t OpenAll() {
+      size_t bytes = 0;
+      for (int i = 0; i < count_; i++) {
+         files_[i].source = OpenSource(files_[i].path);
+         if (files_[i].source >= 0) bytes += gIds.sources[files_[i].source].size;
       }
-      return false;
+      return bytes;
    }
 
-   // Where a name read from the current line stands in the files taken end
-   // to end.
-   PciText TextOf(std::string_view name) const {
-      uint32_t at = gIds.sources[files_[current_].source].base + uint32_t(offset_ + size_t(name.data() - data_));
-      bool notAvail = name.size() >= kNotAvailLen && std::memcmp(name.data(), not_avail_prefix, kNotAvailLen) == 0;
-      return PciText{at, uint8_t(name.size()), notAvail ? kNotAvail : uint8_t(0)};
-   }
-
-   const char *CurrentName() const { return files_[current_].path; }
-   int LineNumber() const { return lineNumber_; }
-   // pci.ids is always the last file: the loader tells it from the override
-   // files by position alone.
-   bool NotLast() const { return current_ < count_ - 1; }
-
-   void Rewind() {
-      current_ = 0;
-      started_ = false;
-      lineNumber_ = 0;
-   }
+   int Count() const { return count_; }
+   const IdFile &operator[](int index) const { return files_[index]; }
 
 private:
-   // Opens the current file the first time; each reading then starts at its
-   // first byte.  False for a file without bytes.
-   bool StartFile() {
-      IdFile &f = files_[current_];
-      if (!f.opened) Open(f);
-      if (f.source < 0) return false;
-      const Source &s = gIds.sources[f.source];
-      offset_ = 0;
-      pos_ = 0;
-      if (f.fd < 0) {
-         data_ = s.bytes;
-         length_ = s.size;
-         unread_ = 0;
-      } else {
-         // A mapped file is read through the buffer; its mapping is touched
-         // only where a name is printed.
-         if (lseek(f.fd, 0, SEEK_SET) != 0) return false;
-         data_ = buffer_.get();
-         length_ = 0;
-         unread_ = s.size;
-      }
-      firstNul_ = static_cast<const char *>(std::memchr(data_, '\0', length_));
-      return true;
-   }
-
-   void Open(IdFile &f) {
-      f.opened = true;
-      int fd = open(f.path, O_RDONLY | O_CLOEXEC);
-      if (fd < 0) return;
-      struct stat st;
-      if (fstat(fd, &st) == 0 && S_ISREG(st.st_mode) && st.st_size > 0 && uint64_t(st.st_size) <= UINT32_MAX) {
-         size_t size = size_t(st.st_size);
-         void *map = mmap(nullptr, size, PROT_READ, MAP_PRIVATE, fd, 0);
-         if (map != MAP_FAILED) {
-            if (gIds.sources.Add(static_cast<const char *>(map), size, true, &f.source)) {
-               f.fd = fd;
-               return;
-            }
-            munmap(map, size);
-         }
-      }
-      size_t size;
-      MallocPtr<char> bytes = ReadAll(fd, &size);
-      close(fd);
-      if (size > 0 && gIds.sources.Add(bytes.get(), size, false, &f.source)) (void)bytes.release();
-   }
-
-   // Keeps at least one whole piece ahead in the buffer while the file has
-   // bytes left to read.  Reads stop at the size the file was mapped with.
-   void Refill() {
-      if (unread_ == 0) return;
-      std::memmove(buffer_.get(), buffer_.get() + pos_, length_ - pos_);
-      offset_ += pos_;
-      length_ -= pos_;
-      pos_ = 0;
-      int fd = files_[current_].fd;
-      while (length_ < kLinePiece && unread_ > 0) {
-         size_t want = kReadChunk - length_ < unread_ ? kReadChunk - length_ : unread_;
-         ssize_t n = read(fd, buffer_.get() + length_, want);
-         if (n < 0 && errno == EINTR) continue;
-         if (n <= 0) {
-            unread_ = 0;
-            break;
-         }
-         length_ += size_t(n);
-         unread_ -= size_t(n);
-      }
-      firstNul_ = static_cast<const char *>(std::memchr(buffer_.get(), '\0', length_));
-   }
-
-   void NextFile() {
-      current_++;
-      started_ = false;
-      lineNumber_ = 0;
-   }
-
    MallocPtr<IdFile> files_;
    int count_ = 0;
    size_t capacity_ = 0;
-   MallocPtr<char> buffer_;  // kReadChunk bytes
-   // The cursor: the file, its line number, and its bytes at hand: data_
-   // holds length_ bytes from file offset offset_, pos_ is the next one.
-   int current_ = 0;
-   int lineNumber_ = 0;
-   bool started_ = false;
-   const char *data_ = nullptr;
-   size_t length_ = 0;
-   size_t pos_ = 0;
-   size_t offset_ = 0;
-   size_t unread_ = 0;                // bytes of the file still to read
-   const char *firstNul_ = nullptr;   // first NUL at hand, if any
 };
-
-char At(std::string_view s, size_t i) { return i < s.size() ? s[i] : '\0'; }
-
-bool IsHexDigit(char c) {
-   return (c >= '0' && c <= '9') || (c >= 'a' && c <= 'f') || (c >= 'A' && c <= 'F');
-}
-
-bool IsBlank(char c) { return c == ' ' || c == '\t'; }
-
-unsigned HexDigitValue(char c) {
-   if (c <= '9') return unsigned(c - '0');
-   return unsigned((c | 0x20) - 'a' + 10);
-}
 
 // Hexadecimal digits into 32 bits; like strtoul on the 32-bit host, a value
 // too large for 32 bits gives 0xffffffff.
 uint32_t HexValue(std::string_view digits) {
    uint64_t value = 0;
    for (char c : digits) {
-      value = value * 16 + HexDigitValue(c);
+      value = value * 16 + HexDigit(c);
       if (value > UINT32_MAX) return UINT32_MAX;
    }
    return uint32_t(value);
@@ -461,13 +474,63 @@ uint32_t LeadingHexId(std::string_view text) {
    return HexValue(text.substr(start, i - start));
 }
 
+// ParsePciIdLine, inlined into the loader's loop, which calls it for nearly
+// every line with a constant capacity.
+[[gnu::always_inline]] inline bool SplitIdLine(std::string_view text, size_t nameCapacity, PciIdField *field) {
+   const char *p = text.data();
+   const char *end = p + text.size();
+   while (p < end && IsBlank(*p)) p++;
+   // The ID is the hexadecimal digits up to a blank.  Text that ends first
+   // or any other byte in the ID fails; a newline does not end an ID, so a
+   // line with an ID alone fails here.
+   const char *start = p;
+   uint64_t value = 0;
+   // Nearly every ID starts with four digits: take them at once.
+   if (end - p > 4 && (HexDigit(p[0]) | HexDigit(p[1]) | HexDigit(p[2]) | HexDigit(p[3])) < 16) {
+      value = unsigned(HexDigit(p[0])) << 12 | unsigned(HexDigit(p[1])) << 8 | unsigned(HexDigit(p[2])) << 4 |
+              HexDigit(p[3]);
+      p += 4;
+   }
+   for (; p < end && IsHexDigit(*p); p++)
+      if (value <= UINT32_MAX) value = value * 16 + HexDigit(*p);
+   if (p == start || p == end || !IsBlank(*p)) return false;
+   field->id = value > UINT32_MAX ? UINT32_MAX : uint32_t(value);
+   field->idEnd = size_t(p - text.data());
+   if (nameCapacity == 0) return true;
+   p++;
+   while (p < end && IsBlank(*p)) p++;
+   if (p == end || *p == '\n') return false;
+   size_t len = size_t(end - p);
+   if (end[-1] == '\n') len--;
+   field->name = std::string_view(p, len < nameCapacity - 1 ? len : nameCapacity - 1);
+   return true;
+}
+
+// Four hexadecimal digits at p: their value, or -1.
+[[gnu::always_inline]] inline int Hex4(const char *p) {
+   unsigned a = HexDigit(p[0]), b = HexDigit(p[1]), c = HexDigit(p[2]), d = HexDigit(p[3]);
+   return (a | b | c | d) < 16 ? int(a << 12 | b << 8 | c << 4 | d) : -1;
+}
+
+// The name of a line that follows blanks from offset at on, without the
+// line's newline and cut to capacity - 1 characters; false when there is
+// none.
+[[gnu::always_inline]] inline bool NameFrom(std::string_view line, size_t at, size_t capacity, std::string_view *name) {
+   size_t end = line.size();
+   while (at < end && IsBlank(line[at])) at++;
+   if (at == end || line[at] == '\n') return false;
+   if (line[end - 1] == '\n') end--;
+   *name = line.substr(at, end - at < capacity - 1 ? end - at : capacity - 1);
+   return true;
+}
+
 // Comment and blank lines, skipped by every counting and device pass.
 bool IsSkipped(std::string_view line) {
    char c = At(line, 0);
    return c == '#' || c == ' ' || c == '\n';
 }
 
-bool EndsVendorSection(std::string_view line) { return line.substr(0, 4) == "ffff"; }
+bool EndsVendorSection(std::string_view line) { return line.size() >= 4 && std::memcmp(line.data(), "ffff", 4) == 0; }
 
 int LeadingTabs(std::string_view line) {
    int tabs = 0;
@@ -475,106 +538,210 @@ int LeadingTabs(std::string_view line) {
    return tabs;
 }
 
-// Pass 1: the device rows.  In pci.ids a vendor line makes a row too; in an
-// override file it only names the vendor for the lines after it.
-int CountDeviceRows(FileList &files) {
-   int count = 0;
-   std::string_view line;
-   while (files.NextLine(&line)) {
-      if (IsSkipped(line)) continue;
-      if (EndsVendorSection(line)) break;
-      int tabs = LeadingTabs(line);
-      if ((!files.NotLast() && IsHexDigit(At(line, 0))) || tabs == 1 || tabs == 2) count++;
-   }
-   return count;
-}
-
-// Pass 2: the class rows, from after the "ffff" line to the end of input.
-int CountClassRows(FileList &files) {
-   int count = 0;
-   std::string_view line;
-   while (files.NextLine(&line)) {
-      if (IsSkipped(line)) continue;
-      if (At(line, 0) == '\t' || At(line, 0) == 'C') count++;
-   }
-   return count;
-}
-
 uint32_t DeviceKey(uint16_t vendor, uint16_t device) { return uint32_t(vendor) << 16 | device; }
+uint32_t DeviceKey(const PciDevEntry &row) { return DeviceKey(row.vendor, row.device); }
 
-// Rows beyond the counted size are counted but never written, so the count
-// check can report them.
-void AddDevRow(int *made, const PciDevEntry &row) {
-   if (*made < gIds.ndevid) {
-      if (*made == 0 || DeviceKey(row.vendor, row.device) !=
-                           DeviceKey(gIds.dev[*made - 1].vendor, gIds.dev[*made - 1].device))
-         gIds.keyRuns++;
-      gIds.dev[*made] = row;
+// Formats a report of the filling, to be printed once the counts are known.
+[[gnu::format(printf, 2, 3)]] void Keep(char (&report)[kReportSize], const char *format, ...) {
+   va_list args;
+   va_start(args, format);
+   std::vsnprintf(report, sizeof report, format, args);
+   va_end(args);
+}
+
+// One reading of the ID files that does the work of the counting and the
+// filling passes together.  Lines come in through Line(), file by file;
+// Finish() ends the input and Commit() reports and keeps the tables.
+class Loader {
+public:
+   // The file whose lines come next: its path, whether it is the last of
+   // the list (pci.ids is told from the override files by position alone),
+   // and its bytes.
+   void StartFile(const char *path, bool last, const Source &source) {
+      path_ = path;
+      last_ = last;
+      source_ = &source;
+      lineNumber_ = 0;
    }
-   (*made)++;
-}
 
-void AddClassRow(int *made, const PciClassEntry &row) {
-   if (*made < gIds.nclass) gIds.cls[*made] = row;
-   (*made)++;
-}
+   void Line(std::string_view line) {
+      lineNumber_++;
+      if (inVendorSection_) {
+         if (IsSkipped(line)) {
+            if (deviceFill_) return;
+         } else if (EndsVendorSection(line)) {
+            inVendorSection_ = false;
+            if (deviceFill_) {
+               EndDeviceFill(true);
+               return;
+            }
+         } else {
+            int tabs = LeadingTabs(line);
+            if ((last_ && IsHexDigit(At(line, 0))) || tabs == 1 || tabs == 2) ndevid_++;
+            if (deviceFill_) {
+               if (!DeviceLine(line, tabs)) EndDeviceFill(!noMemory_);
+               return;
+            }
+         }
+      } else if (!IsSkipped(line) && (At(line, 0) == '\t' || At(line, 0) == 'C')) {
+         nclass_++;
+      }
+      // The device filling has ended: the line belongs to the class filling.
+      // Once rows the device filling did not make are counted, the build
+      // fails there and the class filling would never run.
+      if (classFill_ && devMade_ < ndevid_) classFill_ = false;
+      if (classFill_ && !ClassLine(line)) classFill_ = false;
+   }
 
-void ImproperlyFormatted(const FileList &files, int which) {
-   std::fprintf(stderr, "%s: line %d improperly formatted(%d)\n", files.CurrentName(),
-                files.LineNumber(), which);
-}
+   void Finish() {
+      if (deviceFill_) EndDeviceFill(true);
+      if (classFill_) CloseBlock();
+   }
 
-// Pass 3: fills the device table.  The current vendor and device carry over
-// from one file to the next, so an override file may begin with device
-// lines for the vendor named last.  False for a failed build.
-bool FillDeviceTable(FileList &files) {
-   constexpr uint16_t kNone = 0xffff;
-   const PciText empty{0, 0, 0};
-   uint16_t vendorId = 0;
-   PciText vendorName = empty;
-   uint16_t deviceId = 0;
-   int made = 0;
-   std::string_view line;
-   while (files.NextLine(&line)) {
-      if (IsSkipped(line)) continue;
-      if (EndsVendorSection(line)) break;
-      int tabs = LeadingTabs(line);
+   // Prints what the two readings would print, in their order, and keeps
+   // the tables or drops them.  False for a failed build.
+   bool Commit(const char *idsPath) {
+      if (ndevid_ == 0) std::fputs("no device entries in the pci ids files\nPerhaps, corrupted file?\n", stderr);
+      if (nclass_ == 0) std::fprintf(stderr, "no class entries in %s\nPerhaps, corrupted file?\n", idsPath);
+      if (noDevMemory_)
+         std::fprintf(stderr, "couldn't allocate PciDevTable (%zu bytes)\n", size_t(ndevid_) * sizeof(PciDevEntry));
+      if (noClassMemory_)
+         std::fprintf(stderr, "couldn't allocate PciClassCodeTable (%zu bytes)\n",
+                      size_t(nclass_) * sizeof(PciClassEntry));
+      if (noMemory_) return false;
+      std::fputs(deviceReport_, stderr);
+      if (devMade_ != ndevid_) {
+         std::fprintf(stderr, "parsing problem: devices %u ndevid %u\n", unsigned(devMade_), unsigned(ndevid_));
+         return false;
+      }
+      std::fputs(classReport_, stderr);
+      if (classMade_ != nclass_) {
+         std::fprintf(stderr, "internal error: classes %u nclass %u\n", unsigned(classMade_), unsigned(nclass_));
+         return false;
+      }
+      gIds.ndevid = ndevid_;
+      gIds.nclass = nclass_;
+      return true;
+   }
+
+private:
+   enum class Block { None, Class, Subclass, ProgIf };
+
+   // The device filling ends at the "ffff" line, at a malformed line or
+   // with the input; the class filling starts on the next line unless
+   // memory ran out.
+   void EndDeviceFill(bool startClassFill) {
+      deviceFill_ = false;
+      classFill_ = startClassFill;
+   }
+
+   // Where a name read from the current line stands in the files taken end
+   // to end.
+   PciText TextOf(std::string_view name) const {
+      uint32_t at = source_->base + uint32_t(name.data() - source_->bytes);
+      bool notAvail = name.size() >= kNotAvailLen && name[0] == not_avail_prefix[0] &&
+                      std::memcmp(name.data(), not_avail_prefix, kNotAvailLen) == 0;
+      return PciText{at, uint8_t(name.size()), notAvail ? kNotAvail : uint8_t(0)};
+   }
+
+   bool AddDevRow(const PciDevEntry &row) {
+      if (!gIds.dev.Append(row)) {
+         noDevMemory_ = noMemory_ = true;
+         return false;
+      }
+      if (devMade_ == 0 || DeviceKey(row) != lastKey_) gIds.keyRuns++;
+      lastKey_ = DeviceKey(row);
+      if (!last_) gIds.lastOverrideIndex = devMade_;
+      devMade_++;
+      return true;
+   }
+
+   // Lines in the usual shape, four digits and a blank for each ID and then
+   // a name, are split here at fixed places, as the general parse would
+   // split them; false leaves the line to the general parse.
+   bool UsualDeviceLine(std::string_view line, int tabs, bool *more) {
+      constexpr uint16_t kNone = 0xffff;
+      std::string_view name;
+      if (tabs == 0) {
+         int vendor = line.size() > 5 && IsBlank(line[4]) ? Hex4(line.data()) : -1;
+         if (vendor < 0 || !NameFrom(line, 5, kVendorNameCap, &name)) return false;
+         vendorId_ = uint16_t(vendor);
+         vendorName_ = TextOf(name);
+         *more = !last_ || AddDevRow(PciDevEntry{vendorId_, kNone, kNone, kNone, vendorName_, PciText{0, 0, 0}});
+         return true;
+      }
+      if (tabs == 1) {
+         int device = line.size() > 6 && IsBlank(line[5]) ? Hex4(line.data() + 1) : -1;
+         if (device < 0 || !NameFrom(line, 6, kDeviceNameCap, &name)) return false;
+         deviceId_ = uint16_t(device);
+         *more = AddDevRow(PciDevEntry{vendorId_, deviceId_, 0, 0, vendorName_, TextOf(name)});
+         return true;
+      }
+      if (tabs == 2 && vendorName_.len != 0 && line.size() > 12 && IsBlank(line[6]) && IsBlank(line[11])) {
+         int subvendor = Hex4(line.data() + 2), subdevice = Hex4(line.data() + 7);
+         if (subvendor < 0 || subdevice < 0 || !NameFrom(line, 12, kDeviceNameCap, &name)) return false;
+         *more = AddDevRow(PciDevEntry{vendorId_, deviceId_, uint16_t(subvendor), uint16_t(subdevice), vendorName_,
+                                       TextOf(name)});
+         return true;
+      }
+      return false;
+   }
+
+   void ImproperlyFormatted(char (&report)[kReportSize], int which) {
+      Keep(report, "%s: line %d improperly formatted(%d)\n", path_, lineNumber_, which);
+   }
+
+   // One line of the vendor section, with its leading tabs counted; false
+   // when it ends the device filling.  The current vendor and device carry
+   // over from one file to the next, so an override file may begin with
+   // device lines for the vendor named last.
+   bool DeviceLine(std::string_view line, int tabs) {
+      constexpr uint16_t kNone = 0xffff;
+      const PciText empty{0, 0, 0};
+      bool more;
+      if (UsualDeviceLine(line, tabs, &more)) return more;
       PciIdField field;
       if (tabs == 0) {
-         vendorName = empty;
-         if (!ParsePciIdLine(line, kVendorNameCap, &field)) {
-            ImproperlyFormatted(files, 1);
-            break;
+         vendorName_ = empty;
+         if (!SplitIdLine(line, kVendorNameCap, &field)) {
+            ImproperlyFormatted(deviceReport_, 1);
+            return false;
          }
-         vendorId = uint16_t(field.id);
-         vendorName = files.TextOf(field.name);
-         if (files.NotLast()) continue;
-         AddDevRow(&made, PciDevEntry{vendorId, kNone, kNone, kNone, vendorName, empty});
-      } else if (tabs == 1) {
+         vendorId_ = uint16_t(field.id);
+         vendorName_ = TextOf(field.name);
+         // In pci.ids a vendor line makes a row too; in an override file it
+         // only names the vendor for the lines after it.
+         return !last_ || AddDevRow(PciDevEntry{vendorId_, kNone, kNone, kNone, vendorName_, empty});
+      }
+      if (tabs == 1) {
          // The row keeps the ID written on the line even when the name is
          // missing.
          std::string_view text = line.substr(1);
-         deviceId = uint16_t(LeadingHexId(text));
          PciText name;
-         if (ParsePciIdLine(text, kDeviceNameCap, &field)) {
-            name = files.TextOf(field.name);
-         } else if (vendorName.len == 0) {
-            std::fprintf(stderr, "%s: can't synthesize device name for line %d\n", files.CurrentName(),
-                         files.LineNumber());
-            break;
+         if (SplitIdLine(text, kDeviceNameCap, &field)) {
+            deviceId_ = uint16_t(field.id);
+            name = TextOf(field.name);
+         } else if (vendorName_.len == 0) {
+            Keep(deviceReport_, "%s: can't synthesize device name for line %d\n", path_, lineNumber_);
+            return false;
          } else {
             // A device line without a name is named after its vendor.
+            deviceId_ = uint16_t(LeadingHexId(text));
             char synthesized[kDeviceNameCap];
-            std::string_view vendor = PciName(vendorName);
+            std::string_view vendor = PciName(vendorName_);
             std::snprintf(synthesized, sizeof synthesized, "%s%.*s device", not_avail_prefix,
                           int(vendor.size()), vendor.data());
-            if (!StoreMadeUpName(synthesized, &name)) return false;
+            if (!StoreMadeUpName(synthesized, &name)) {
+               noMemory_ = true;
+               return false;
+            }
          }
-         AddDevRow(&made, PciDevEntry{vendorId, deviceId, 0, 0, vendorName, name});
-      } else if (tabs == 2) {
-         if (!ParsePciIdLine(line.substr(2), 0, &field)) {
-            ImproperlyFormatted(files, 3);
-            break;
+         return AddDevRow(PciDevEntry{vendorId_, deviceId_, 0, 0, vendorName_, name});
+      }
+      if (tabs == 2) {
+         if (!SplitIdLine(line.substr(2), 0, &field)) {
+            ImproperlyFormatted(deviceReport_, 3);
+            return false;
          }
          uint16_t subvendor = uint16_t(field.id);
          // The subsystem device ID is read from the eighth byte on, where it
@@ -584,95 +751,117 @@ bool FillDeviceTable(FileList &files) {
          size_t separator = 2 + field.idEnd;
          std::string_view rest = line.size() > 7 ? line.substr(7) : std::string_view();
          if (separator >= 7) rest = rest.substr(0, separator - 7);
-         if (!ParsePciIdLine(rest, kDeviceNameCap, &field)) {
-            ImproperlyFormatted(files, 4);
-            break;
+         if (!SplitIdLine(rest, kDeviceNameCap, &field)) {
+            ImproperlyFormatted(deviceReport_, 4);
+            return false;
          }
-         if (vendorName.len == 0) {
-            std::fprintf(stderr, "no vendor information for subvendor 0%04x: subsystem 0%04x", subvendor,
-                         unsigned(uint16_t(field.id)));
-            break;
+         if (vendorName_.len == 0) {
+            Keep(deviceReport_, "no vendor information for subvendor 0%04x: subsystem 0%04x", subvendor,
+                 unsigned(uint16_t(field.id)));
+            return false;
          }
-         AddDevRow(&made, PciDevEntry{vendorId, deviceId, subvendor, uint16_t(field.id), vendorName,
-                                      files.TextOf(field.name)});
-      } else {
-         continue;  // three tabs: nothing in the vendor section uses them
+         return AddDevRow(PciDevEntry{vendorId_, deviceId_, subvendor, uint16_t(field.id), vendorName_,
+                                      TextOf(field.name)});
       }
-      if (files.NotLast()) gIds.lastOverrideIndex = made - 1;
+      return true;  // three tabs: nothing in the vendor section uses them
    }
-   if (made != gIds.ndevid) {
-      std::fprintf(stderr, "parsing problem: devices %u ndevid %u\n", unsigned(made), unsigned(gIds.ndevid));
-      return false;
+
+   void AddClassRow(const PciClassEntry &row) {
+      if (!noClassMemory_ && GrowArray(&gIds.cls, &gIds.clsCapacity, size_t(classMade_) + 1))
+         gIds.cls[classMade_] = row;
+      else
+         noClassMemory_ = noMemory_ = true;
+      classMade_++;
    }
-   return true;
-}
 
-// Pass 4: fills the class table from the line after the one that ended
-// pass 3.  Within a class block the rows come as each prog-if row, then its
-// subclass's own row, and after all subclasses the class-level row: the
-// class lookup relies on that order.  False for a failed build.
-bool FillClassTable(FileList &files) {
-   enum class Block { None, Class, Subclass, ProgIf };
-   Block block = Block::None;
-   const PciText empty{0, 0, 0};
-   uint8_t classId = 0, subclassId = 0;
-   PciText className = empty, subclassName = empty;
-   int made = 0;
+   void AddSubclassRow() {
+      AddClassRow(PciClassEntry{classId_, subclassId_, 0xff, className_, subclassName_, PciText{0, 0, 0}});
+   }
 
-   auto addSubclassRow = [&] {
-      AddClassRow(&made, PciClassEntry{classId, subclassId, 0xff, className, subclassName, empty});
-   };
-   auto closeBlock = [&] {
-      if (block == Block::Subclass || block == Block::ProgIf) addSubclassRow();
-      if (block != Block::None) AddClassRow(&made, PciClassEntry{classId, 0xff, 0xff, className, empty, empty});
-   };
+   // Adds the rows the open block still owes.
+   void CloseBlock() {
+      if (block_ == Block::Subclass || block_ == Block::ProgIf) AddSubclassRow();
+      if (block_ != Block::None)
+         AddClassRow(PciClassEntry{classId_, 0xff, 0xff, className_, PciText{0, 0, 0}, PciText{0, 0, 0}});
+   }
 
-   bool ended = false;  // by a malformed line rather than the end of input
-   std::string_view line;
-   PciIdField field;
-   while (!ended && files.NextLine(&line)) {
+   // One line for the class table; false when a malformed line ends the
+   // filling.  Within a class block the rows come as each prog-if row, then
+   // its subclass's own row, and after all subclasses the class-level row:
+   // the class lookup relies on that order.
+   bool ClassLine(std::string_view line) {
+      PciIdField field;
+      int tabs = LeadingTabs(line);
       if (At(line, 0) == 'C') {
-         closeBlock();
-         if (!ParsePciIdLine(line.substr(1), kClassNameCap, &field)) {
-            ImproperlyFormatted(files, 5);
-            ended = true;
-            continue;
+         CloseBlock();
+         if (!SplitIdLine(line.substr(1), kClassNameCap, &field)) {
+            ImproperlyFormatted(classReport_, 5);
+            return false;
          }
-         classId = uint8_t(field.id);
-         className = files.TextOf(field.name);
-         block = Block::Class;
-      } else if (LeadingTabs(line) >= 2) {
-         if (!ParsePciIdLine(line.substr(2), kClassNameCap, &field)) {
-            ImproperlyFormatted(files, 7);
-            ended = true;
-            continue;
+         classId_ = uint8_t(field.id);
+         className_ = TextOf(field.name);
+         block_ = Block::Class;
+      } else if (tabs >= 2) {
+         if (!SplitIdLine(line.substr(2), kClassNameCap, &field)) {
+            ImproperlyFormatted(classReport_, 7);
+            return false;
          }
-         AddClassRow(&made, PciClassEntry{classId, subclassId, uint8_t(field.id), className, subclassName,
-                                          files.TextOf(field.name)});
-         block = Block::ProgIf;
-      } else if (LeadingTabs(line) == 1) {
-         if (block == Block::Subclass || block == Block::ProgIf) addSubclassRow();
-         if (!ParsePciIdLine(line.substr(1), kClassNameCap, &field)) {
-            ImproperlyFormatted(files, 6);
-            ended = true;
-            continue;
+         AddClassRow(PciClassEntry{classId_, subclassId_, uint8_t(field.id), className_, subclassName_,
+                                   TextOf(field.name)});
+         block_ = Block::ProgIf;
+      } else if (tabs == 1) {
+         if (block_ == Block::Subclass || block_ == Block::ProgIf) AddSubclassRow();
+         if (!SplitIdLine(line.substr(1), kClassNameCap, &field)) {
+            ImproperlyFormatted(classReport_, 6);
+            return false;
          }
-         subclassId = uint8_t(field.id);
-         subclassName = files.TextOf(field.name);
-         block = Block::Subclass;
+         subclassId_ = uint8_t(field.id);
+         subclassName_ = TextOf(field.name);
+         block_ = Block::Subclass;
       } else {
          // Any other line, comments included, closes nothing: the rows the
          // open block still owes are lost, and the count check notices.
-         block = Block::None;
+         block_ = Block::None;
       }
+      return true;
    }
-   if (!ended) closeBlock();
-   if (made != gIds.nclass) {
-      std::fprintf(stderr, "internal error: classes %u nclass %u\n", unsigned(made), unsigned(gIds.nclass));
-      return false;
-   }
-   return true;
-}
+
+   // The current file and line.
+   const char *path_ = nullptr;
+   bool last_ = false;
+   const Source *source_ = nullptr;
+   int lineNumber_ = 0;
+
+   // The counts.
+   bool inVendorSection_ = true;  // before the "ffff" line
+   int ndevid_ = 0;
+   int nclass_ = 0;
+
+   // The device filling.
+   bool deviceFill_ = true;
+   int devMade_ = 0;
+   uint32_t lastKey_ = 0;
+   uint16_t vendorId_ = 0;
+   PciText vendorName_{0, 0, 0};
+   uint16_t deviceId_ = 0;
+   char deviceReport_[kReportSize] = "";
+
+   // The class filling.
+   bool classFill_ = false;  // a malformed line ends it with its block left open
+   int classMade_ = 0;
+   Block block_ = Block::None;
+   uint8_t classId_ = 0;
+   uint8_t subclassId_ = 0;
+   PciText className_{0, 0, 0};
+   PciText subclassName_{0, 0, 0};
+   char classReport_[kReportSize] = "";
+
+   // Memory that could not be had: for the device table, the class table,
+   // or any of them (a synthesized name included).
+   bool noDevMemory_ = false;
+   bool noClassMemory_ = false;
+   bool noMemory_ = false;
+};
 
 void FailBuild() {
    DropTables();
@@ -707,20 +896,13 @@ struct DeviceChoice {
    }
 };
 
-// The slot of a (vendor, device) pair: its own, or the empty one where it
-// would go.
-uint32_t ProbeSlot(uint32_t key) {
-   uint32_t mask = gIds.slotCount - 1;
-   uint32_t slot = (key * 0x9E3779B1u) >> gIds.slotShift;
-   for (;;) {
-      int32_t head = gIds.slots[slot];
-      if (head == 0 || DeviceKey(gIds.dev[head - 1].vendor, gIds.dev[head - 1].device) == key) return slot;
-      slot = (slot + 1) & mask;
-   }
-}
+uint32_t HomeSlot(uint32_t key) { return (key * 0x9E3779B1u) >> gIds.slotShift; }
 
-// Builds the index once, with at most two thirds of its slots used.
-// Without memory for it the lookups scan instead.
+// Builds the index once, with at most two thirds of its slots used: one
+// entry per run of rows with the same (vendor, device).  With linear probing
+// and no removals, the runs of one pair are met along the probe sequence in
+// the order they were entered, which is table order.  Without memory for
+// the index the lookups scan instead.
 void BuildDeviceIndex() {
    gIds.indexTried = true;
    uint32_t count = 16;
@@ -729,19 +911,22 @@ void BuildDeviceIndex() {
       count *= 2;
       shift--;
    }
-   gIds.slotCount = count;
-   gIds.slotShift = shift;
-   if (!MapZeroed(count, &gIds.slots) || !MapZeroed(size_t(gIds.ndevid), &gIds.next)) {
+   if (!MapZeroed(count, &gIds.slots)) {
       DropIndex();
       gIds.indexTried = true;
       return;
    }
-   // Walking backwards and pushing each row in front leaves every chain in
-   // table order.
-   for (int i = gIds.ndevid - 1; i >= 0; i--) {
-      int32_t &head = gIds.slots[ProbeSlot(DeviceKey(gIds.dev[i].vendor, gIds.dev[i].device))];
-      gIds.next[i] = head;
-      head = i + 1;
+   gIds.slotCount = count;
+   gIds.slotShift = shift;
+   uint32_t lastKey = 0;
+   uint32_t mask = count - 1;
+   for (int i = 0; i < gIds.ndevid; i++) {
+      uint32_t key = DeviceKey(gIds.dev[i]);
+      if (i > 0 && key == lastKey) continue;
+      lastKey = key;
+      uint32_t slot = HomeSlot(key);
+      while (gIds.slots[slot] != 0) slot = (slot + 1) & mask;
+      gIds.slots[slot] = i + 1;
    }
 }
 
@@ -758,26 +943,7 @@ std::string_view PciName(PciText text) {
 }
 
 bool ParsePciIdLine(std::string_view text, size_t nameCapacity, PciIdField *field) {
-   size_t i = 0;
-   while (i < text.size() && IsBlank(text[i])) i++;
-   if (!IsHexDigit(At(text, i))) return false;
-   size_t start = i;
-   // The ID ends at a blank; a newline does not end it, so a line with an
-   // ID alone fails here.
-   while (i < text.size() && !IsBlank(text[i])) i++;
-   if (i == text.size()) return false;
-   for (size_t j = start; j < i; j++)
-      if (!IsHexDigit(text[j])) return false;
-   field->id = HexValue(text.substr(start, i - start));
-   field->idEnd = i;
-   if (nameCapacity == 0) return true;
-   i++;
-   while (i < text.size() && IsBlank(text[i])) i++;
-   if (i == text.size() || text[i] == '\n') return false;
-   std::string_view name = text.substr(i);
-   if (name.back() == '\n') name.remove_suffix(1);
-   field->name = name.substr(0, nameCapacity - 1);
-   return true;
+   return SplitIdLine(text, nameCapacity, field);
 }
 
 bool LoadPciIdTables() { return LoadPciIdTablesFrom(kPciIdsRoot); }
@@ -785,7 +951,6 @@ bool LoadPciIdTables() { return LoadPciIdTablesFrom(kPciIdsRoot); }
 bool LoadPciIdTablesFrom(const char *root) {
    DropTables();
    FileList files;
-   if (!files.Init()) return false;
    for (const char *dir : kOverrideDirs) {
       char path[kMaxPathBuf];
       std::snprintf(path, sizeof path, "%s/%s", root, dir);
@@ -795,28 +960,22 @@ bool LoadPciIdTablesFrom(const char *root) {
    std::snprintf(idsPath, sizeof idsPath, "%s/pci.ids", root);
    if (!files.Add(idsPath)) return false;
 
-   int ndevid = CountDeviceRows(files);
-   if (ndevid == 0) std::fputs("no device entries in the pci ids files\nPerhaps, corrupted file?\n", stderr);
-   int nclass = CountClassRows(files);
-   if (nclass == 0) std::fprintf(stderr, "no class entries in %s\nPerhaps, corrupted file?\n", idsPath);
-
-   // Exact-size tables, zero-filled; an empty one is no failure.
-   bool devOk = MapZeroed(size_t(ndevid), &gIds.dev);
-   if (devOk) gIds.ndevid = ndevid;
-   bool clsOk = MapZeroed(size_t(nclass), &gIds.cls);
-   if (clsOk) gIds.nclass = nclass;
-   if (!devOk)
-      std::fprintf(stderr, "couldn't allocate PciDevTable (%zu bytes)\n", size_t(ndevid) * sizeof(PciDevEntry));
-   if (!clsOk)
-      std::fprintf(stderr, "couldn't allocate PciClassCodeTable (%zu bytes)\n",
-                   size_t(nclass) * sizeof(PciClassEntry));
-   if (!devOk || !clsOk) {
-      FailBuild();
-      return true;
+   // The device table is taken at the size the bytes to come suggest: a
+   // row's line in pci.ids averages about 38 bytes.  A failure here is only
+   // a guess gone wrong; the table then grows as rows come.
+   size_t bytes = files.OpenAll();
+   (void)gIds.dev.Reserve(bytes / kBytesPerRowGuess + 16);
+   Loader loader;
+   for (int i = 0; i < files.Count(); i++) {
+      if (files[i].source < 0) continue;
+      const Source &source = gIds.sources[files[i].source];
+      loader.StartFile(files[i].path, i == files.Count() - 1, source);
+      LineReader lines(source);
+      std::string_view line;
+      while (lines.Next(&line)) loader.Line(line);
    }
-
-   files.Rewind();
-   if (!FillDeviceTable(files) || !FillClassTable(files)) FailBuild();
+   loader.Finish();
+   if (!loader.Commit(idsPath)) FailBuild();
    return true;
 }
 
@@ -826,8 +985,14 @@ const PciDevEntry *LookupPciDevice(uint16_t vendor, uint16_t device, uint16_t su
    if (!gIds.indexTried) BuildDeviceIndex();
    if (gIds.slots == nullptr) return LookupPciDeviceByScan(vendor, device, subvendor, subdevice);
    DeviceChoice choice{subvendor, subdevice};
-   for (int32_t link = gIds.slots[ProbeSlot(DeviceKey(vendor, device))]; link != 0; link = gIds.next[link - 1])
-      if (choice.Offer(link - 1)) break;
+   uint32_t key = DeviceKey(vendor, device);
+   uint32_t mask = gIds.slotCount - 1;
+   for (uint32_t slot = HomeSlot(key); gIds.slots[slot] != 0; slot = (slot + 1) & mask) {
+      int row = gIds.slots[slot] - 1;
+      if (DeviceKey(gIds.dev[row]) != key) continue;
+      for (; row < gIds.ndevid && DeviceKey(gIds.dev[row]) == key; row++)
+         if (choice.Offer(row)) return choice.candidate;
+   }
    return choice.candidate;
 }
 
