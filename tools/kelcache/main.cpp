@@ -99,6 +99,22 @@ int Flushed() {
    return 0;
 }
 
+// Reads what is left of fd to its end.
+bool ReadToEnd(int fd, std::string *bytes, std::string *problem) {
+   bytes->clear();
+   char chunk[65536];
+   for (;;) {
+      ssize_t n = read(fd, chunk, sizeof chunk);
+      if (n < 0 && errno == EINTR) continue;
+      if (n < 0) {
+         *problem = std::strerror(errno);
+         return false;
+      }
+      if (n == 0) return true;
+      bytes->append(chunk, size_t(n));
+   }
+}
+
 // Reads a regular file whole.  Opening never waits, so a FIFO is refused
 // at once instead of blocking until a writer comes.
 bool ReadRegularFile(const char *path, std::string *bytes, std::string *problem) {
@@ -109,43 +125,13 @@ bool ReadRegularFile(const char *path, std::string *bytes, std::string *problem)
    }
    struct stat st;
    bool ok = fstat(fd, &st) == 0;
-   if (!ok) {
+   if (!ok)
       *problem = std::strerror(errno);
-   } else if (!S_ISREG(st.st_mode)) {
+   else if (!S_ISREG(st.st_mode))
       *problem = "not a regular file";
-      ok = false;
-   }
-   bytes->clear();
-   char chunk[65536];
-   while (ok) {
-      ssize_t n = read(fd, chunk, sizeof chunk);
-      if (n < 0 && errno == EINTR) continue;
-      if (n < 0) {
-         *problem = std::strerror(errno);
-         ok = false;
-      }
-      if (n <= 0) break;
-      bytes->append(chunk, size_t(n));
-   }
+   ok = ok && S_ISREG(st.st_mode) && ReadToEnd(fd, bytes, problem);
    close(fd);
    return ok;
-}
-
-// The whole of standard input ("kelcache build -"), whatever it is: a pipe,
-// a file or a terminal.
-bool ReadStandardInput(std::string *bytes, std::string *problem) {
-   bytes->clear();
-   char chunk[65536];
-   for (;;) {
-      ssize_t n = read(STDIN_FILENO, chunk, sizeof chunk);
-      if (n < 0 && errno == EINTR) continue;
-      if (n < 0) {
-         *problem = std::strerror(errno);
-         return false;
-      }
-      if (n == 0) return true;
-      bytes->append(chunk, size_t(n));
-   }
 }
 
 bool WriteAll(int fd, const std::string &bytes) {
@@ -220,7 +206,7 @@ int Build(Args args) {
    if (input.empty() || !haveOutput) return Usage("build needs a snapshot and -o FILE");
 
    std::string json, bytes, problem;
-   bool read = input == "-" ? ReadStandardInput(&json, &problem) : ReadRegularFile(input.c_str(), &json, &problem);
+   bool read = input == "-" ? ReadToEnd(STDIN_FILENO, &json, &problem) : ReadRegularFile(input.c_str(), &json, &problem);
    if (!read) {
       std::fprintf(stderr, "kelcache: %s: %s\n", input == "-" ? "standard input" : input.c_str(), problem.c_str());
       return 1;
