@@ -179,7 +179,7 @@ std::string CacheWriter::Finish(std::span<const uint8_t, 16> signature,
       uint64_t i = HomeHash(e->key) & (slots - 1);
       while (slotted[i] != nullptr) i = (i + 1) & (slots - 1);
       slotted[i] = e;
-      total += e->key.size() + e->data.size();
+      total += kEntryHeadSize + e->key.size() + e->data.size();
    }
    std::string out(total, '\0');
    auto *head = reinterpret_cast<uint8_t *>(out.data());
@@ -191,11 +191,11 @@ std::string CacheWriter::Finish(std::span<const uint8_t, 16> signature,
       StoreU32(slot, uint32_t(KeyHash(e->key) >> 32));
       StoreU32(slot + 4, uint32_t(at));
       StoreU32(slot + 8, uint32_t(e->key.size()));
-      StoreU32(slot + 12, e->status);
+      StoreU32(slot + 12, uint32_t(e->data.size()));
+      StoreU32(head + at, e->status);
+      at += kEntryHeadSize;
       std::memcpy(head + at, e->key.data(), e->key.size());
       at += e->key.size();
-      StoreU32(slot + 16, uint32_t(at));
-      StoreU32(slot + 20, uint32_t(e->data.size()));
       if (!e->data.empty()) std::memcpy(head + at, e->data.data(), e->data.size());
       at += e->data.size();
    }
@@ -437,17 +437,23 @@ KEL_Status CacheReader::Verify(int flags) const {
    return used == count_ ? KEL_STATUS_OK : KEL_STATUS_CACHE_CORRUPT;
 }
 
+// The entry a slot names, checked against the bytes: false when the slot is
+// empty or names bytes outside them.
+static bool EntryOfSlot(std::string_view bytes, const uint8_t *s, std::string_view *key, CacheHit *hit) {
+   uint32_t at = LoadU32(s + 4), keyLen = LoadU32(s + 8), dataLen = LoadU32(s + 12);
+   if (keyLen == 0 || at > bytes.size() ||
+       bytes.size() - at < uint64_t(kEntryHeadSize) + keyLen + dataLen)
+      return false;
+   hit->status = LoadU32(reinterpret_cast<const uint8_t *>(bytes.data()) + at);
+   *key = bytes.substr(at + kEntryHeadSize, keyLen);
+   hit->data = bytes.substr(at + kEntryHeadSize + keyLen, dataLen);
+   return true;
+}
+
 bool CacheReader::SlotAt(uint32_t i, std::string_view *key, CacheHit *hit, uint32_t *tag) const {
    if (i >= slots_) return false;
    const auto *s = reinterpret_cast<const uint8_t *>(bytes_.data()) + kHeaderSize + size_t(i) * kSlotSize;
-   uint32_t keyOff = LoadU32(s + 4), keyLen = LoadU32(s + 8);
-   uint32_t dataOff = LoadU32(s + 16), dataLen = LoadU32(s + 20);
-   if (keyLen == 0) return false;
-   if (keyOff > bytes_.size() || bytes_.size() - keyOff < keyLen) return false;
-   if (dataOff > bytes_.size() || bytes_.size() - dataOff < dataLen) return false;
-   *key = bytes_.substr(keyOff, keyLen);
-   hit->status = LoadU32(s + 12);
-   hit->data = bytes_.substr(dataOff, dataLen);
+   if (!EntryOfSlot(bytes_, s, key, hit)) return false;
    *tag = LoadU32(s);
    return true;
 }
@@ -479,14 +485,9 @@ KEL_Status CacheReader::Lookup(std::string_view key, CacheHit *hit) const {
       uint32_t keyLen = LoadU32(s + 8);
       if (keyLen == 0) return KEL_STATUS_NOT_FOUND;
       if (LoadU32(s) != tag || keyLen != key.size()) continue;
-      uint32_t keyOff = LoadU32(s + 4);
-      if (keyOff > bytes_.size() || bytes_.size() - keyOff < keyLen) return KEL_STATUS_CACHE_CORRUPT;
-      if (std::memcmp(bytes_.data() + keyOff, key.data(), keyLen) != 0) continue;
-      uint32_t dataOff = LoadU32(s + 16), dataLen = LoadU32(s + 20);
-      if (dataOff > bytes_.size() || bytes_.size() - dataOff < dataLen) return KEL_STATUS_CACHE_CORRUPT;
-      hit->status = LoadU32(s + 12);
-      hit->data = bytes_.substr(dataOff, dataLen);
-      return KEL_STATUS_OK;
+      std::string_view stored;
+      if (!EntryOfSlot(bytes_, s, &stored, hit)) return KEL_STATUS_CACHE_CORRUPT;
+      if (std::memcmp(stored.data(), key.data(), keyLen) == 0) return KEL_STATUS_OK;
    }
    return KEL_STATUS_NOT_FOUND;
 }

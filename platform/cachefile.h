@@ -3,7 +3,7 @@
 // Layout (all integers little-endian):
 //
 //   0   8  magic "ORXKELC1"
-//   8   4  format version (2)
+//   8   4  format version (3)
 //  12   4  flags (0)
 //  16  16  tree signature
 //  32  24  kernel build date, NUL-padded (at most 20 characters)
@@ -12,24 +12,24 @@
 //  64   8  total file size (at most 4 GiB - 1: offsets are 32 bits)
 //  72   8  checksum of bytes 96 .. total size
 //  80   4  slot count S (a power of two, more than N)
-//  84   4  offset of the first key byte (96 + 24 * S)
+//  84   4  offset of the first entry byte (96 + 16 * S)
 //  88   4  reserved (0)
 //  92   4  check of bytes 56 .. 92, the fields that place everything else
-//  96      slot table: S slots of 24 bytes, a hash table with linear probing:
+//  96      slot table: S slots of 16 bytes, a hash table with linear probing:
 //            0 hash tag (high 32 bits of the whole key's 64-bit hash),
-//            4 key offset, 8 key length (0: an empty slot), 12 status,
-//            16 data offset, 20 data length
-//          then, per entry in slot order, its key bytes directly followed by
-//          its data bytes, so that a lookup touches the slot and one place in
-//          the file.
+//            4 entry offset, 8 key length (0: an empty slot), 12 data length
+//          then, per entry in slot order, its status (4 bytes), its key
+//          bytes and its data bytes, so that a lookup touches the slot and
+//          one place in the file.
 //
 // A lookup starts at slot (home hash & (S - 1)), the home hash being that of
 // the instance keys alone, and walks on to the first empty slot: the
 // entries of one instance share a first slot and so lie side by side, in
-// the slot table and in the file.  Opening checks the header and that the slot table and key area lie
-// within the file (no pass over the data); every offset and length a slot
-// holds is checked when the slot is used.  A full verification (checksum,
-// every slot in bounds, every key found where its hash leads) is kept for
+// the slot table and in the file; four slots fill a cache line.  Opening
+// checks the header and that the slot table and entry area lie within the
+// file (no pass over the data); every offset and length a slot holds is
+// checked when the slot is used.  A full verification (checksum, every slot
+// in bounds, every key found where its hash leads) is kept for
 // `kelcache verify` and `kelcache dump`.
 //
 // A key is: operation (1 byte), node number (2 bytes), then each instance
@@ -65,9 +65,11 @@ namespace kelplat {
 enum class Op : uint8_t { Get = 'G', List = 'L', Set = 'S', Data = 'D', Meta = 'M' };
 
 constexpr char kCacheMagic[8] = {'O', 'R', 'X', 'K', 'E', 'L', 'C', '1'};
-constexpr uint32_t kCacheVersion = 2;
+constexpr uint32_t kCacheVersion = 3;
 constexpr size_t kHeaderSize = 96;
-constexpr size_t kSlotSize = 24;
+constexpr size_t kSlotSize = 16;
+// An entry starts with its status.
+constexpr size_t kEntryHeadSize = 4;
 // The header fields that the header check covers.
 constexpr size_t kHeaderCheckStart = 56, kHeaderCheckOffset = 92;
 constexpr size_t kBuildDateMax = 20;

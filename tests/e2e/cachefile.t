@@ -155,7 +155,7 @@ exit: 0
 file:        @CACHE
 signature:   @SIG (matches this build)
 build date:  Nov 30 2026
-size:        440 bytes
+size:        428 bytes
 entries:     1
 node                                      listings     reads      sets      data
 system_version                                   0         1         0         0
@@ -165,7 +165,7 @@ exe: kelcache
 argv: kelcache verify @CACHE
 exit: 0
 --- stdout
-@CACHE: OK, 1 entries, 440 bytes
+@CACHE: OK, 1 entries, 428 bytes
 === case kelcache --version names the version, the tree signature and the build date
 exe: kelcache
 value: SIG @BIN/kelcache --tool-signature
