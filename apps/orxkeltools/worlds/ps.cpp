@@ -126,8 +126,9 @@ struct TextRef {
    uint32_t length;
 };
 
-// Names, affinities and command lines of all nodes, back to back in one
-// buffer, so that a node stays small however long its texts are.  The pool
+// Names, affinities and command lines of all nodes (the latter two only when
+// their columns are printed), back to back in one buffer, so that a node
+// stays small however long its texts are.  The pool
 // stays within 4 GiB, so a 32-bit offset reaches every text.
 struct TextPool {
    MallocPtr<char> bytes;
@@ -294,8 +295,8 @@ bool ReadChildren(CartelChildren &seen, uint32_t cartel) {
    KEL_Status listStatus = GetInstanceList(KEL_NODE_userworld_cartel_child, seen.keys.get(), &children);
 
    uint32_t count = listStatus == KEL_STATUS_OK ? KEL_ParamListUsedCount(children.get()) : 0;
-   if (!GrowArray(&seen.entries, &seen.entryRoom, size_t(seen.entryCount) + 1) ||
-       (count > 0 && !GrowArray(&seen.zombieIds, &seen.zombieIdRoom, size_t(seen.zombieIdCount) + count)))
+   if (!GrowArrayRaw(&seen.entries, &seen.entryRoom, size_t(seen.entryCount) + 1) ||
+       (count > 0 && !GrowArrayRaw(&seen.zombieIds, &seen.zombieIdRoom, size_t(seen.zombieIdCount) + count)))
       return NoZombieMemory();
    CartelChildren::Entry entry{listStatus, seen.zombieIdCount, 0};
    for (uint32_t i = 0; i < count; i++) {
@@ -377,8 +378,10 @@ Gathered ReadWorld(WorldTable &t, const KEL_ParamList *keys, KEL_ParamList *cart
       n.waitState = ReadU32(summary, summarystats::kWaitState);
       n.usedTime = ReadU64(times, statetimes::kUsedTime);
    }
+   // The pool keeps only the texts of the columns asked for.
+   bool keepAffinity = n.schedValid && (t.options & kOptState);
    if (!t.texts.Add(nameText, &n.name) ||
-       (n.schedValid && !t.texts.Add(ReadText(cpus, affinity::kText, sizeof cpus), &n.affinity))) {
+       (keepAffinity && !t.texts.Add(ReadText(cpus, affinity::kText, sizeof cpus), &n.affinity))) {
       OutOfMemory();
       return Gathered::Failed;
    }
@@ -391,6 +394,7 @@ Gathered ReadWorld(WorldTable &t, const KEL_ParamList *keys, KEL_ParamList *cart
                           ? KEL_Get(KEL_NODE_userworld_cartel_cmdline, cartelKeys, cmdline, sizeof cmdline)
                           : KEL_Status(KEL_STATUS_NO_MEMORY);
    t.latest = status;
+   if (!(t.options & kOptCommand)) return Gathered::Kept;
    std::string_view text =
       status == KEL_STATUS_OK ? ReadText(cmdline, 0, sizeof cmdline) : std::string_view("<unavailable>");
    if (!t.texts.Add(text, &n.cmdline)) {
