@@ -9,7 +9,6 @@
 #include <getopt.h>
 
 #include <algorithm>
-#include <cstdarg>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -517,16 +516,9 @@ struct Printer {
    uint32_t userspace = 0;
 };
 
-// Prints a formatted text followed by spaces up to width characters; a
-// longer text is printed whole.
-__attribute__((format(printf, 2, 3))) void PrintPadded(int width, const char *fmt, ...) {
-   char text[64];
-   va_list ap;
-   va_start(ap, fmt);
-   std::vsnprintf(text, sizeof text, fmt, ap);
-   va_end(ap);
-   std::printf("%-*s", std::max(width, 0), text);
-}
+// Prints two spaces and id, the whole padded with spaces to width
+// characters; a longer text is printed whole.
+void PrintIdColumn(int width, int32_t id) { std::printf("  %-*d", std::max(width - 2, 0), id); }
 
 void PrintPsHeader(const Printer &p) {
    uint32_t o = p.t.options;
@@ -597,11 +589,11 @@ void PrintPsRow(const Printer &p, const WorldNode &n) {
    int w = p.idWidth, m = int(t.longestName);
    bool zombie = n.isZombie;
    uint32_t cartel = n.cartelId;
-   PrintPadded(w, "%d", int32_t(n.worldId));
+   std::printf("%-*d", std::max(w, 0), int32_t(n.worldId));
    if (cartel == 0)
       std::printf("%-*s", w + 2, "  0");
    else
-      PrintPadded(w, "  %d", int32_t(cartel));
+      PrintIdColumn(w, int32_t(cartel));
    if (zombie) {
       std::printf("%-*s", m + 2, "  <zombie>");
    } else {
@@ -610,17 +602,17 @@ void PrintPsRow(const Printer &p, const WorldNode &n) {
    }
    if ((o & kOptChildren) && (o & kOptTree) && !zombie) std::printf("  %-9d", n.nChildren);
    if ((o & kOptThreads) && (o & kOptTree) && !zombie) std::printf("  %-8d", n.nThreads);
-   if ((o & kOptGid) && !zombie) PrintPadded(w, "  %d", n.groupId);
+   if ((o & kOptGid) && !zombie) PrintIdColumn(w, n.groupId);
    if (o & kOptSession) {
       if (cartel == 0) {
          std::printf("%-*s", w, "  0");
          std::printf("%-*s", w, "  0");
       } else {
-         PrintPadded(w - 2, "  %d", n.processGroupId);
-         PrintPadded(w - 2, "  %d", n.sessionId);
+         PrintIdColumn(w - 2, n.processGroupId);
+         PrintIdColumn(w - 2, n.sessionId);
       }
    }
-   if (o & kOptPcid) PrintPadded(w + 2, "  %d", int32_t(n.parentCartelId));
+   if (o & kOptPcid) PrintIdColumn(w + 2, int32_t(n.parentCartelId));
    if ((o & kOptType) && !zombie) PrintType(o, n.typeBits);
    if (o & kOptState) {
       if (zombie || !n.schedValid) {
@@ -645,7 +637,10 @@ void PrintPsRow(const Printer &p, const WorldNode &n) {
 }
 
 // A glyph of the DEC Special Graphics set, shifted in and out around it.
-void Glyph(char letter) { std::printf("%c%c%c", 14, letter, 15); }
+void Glyph(char letter) {
+   const char shifted[] = {14, letter, 15};
+   std::fwrite(shifted, 1, sizeof shifted, stdout);
+}
 
 // Prints the line of node index at the given depth: its tree prefix and its
 // row.  The first depth steps of the path are its ancestors, root first.
