@@ -127,8 +127,8 @@ struct TextRef {
 
 // Names, affinities and command lines of all nodes (the latter two only when
 // their columns are printed), back to back in one buffer, so that a node
-// stays small however long its texts are.  The pool
-// stays within 4 GiB, so a 32-bit offset reaches every text.
+// stays small however long its texts are.  The pool stays within 4 GiB, so
+// a 32-bit offset reaches every text.
 struct TextPool {
    MallocPtr<char> bytes;
    size_t used = 0;
@@ -191,7 +191,8 @@ struct WorldTable {
    MallocPtr<WorldNode> nodes;
    size_t nodeRoom = 0;
    uint32_t nodeCount = 0;
-   // The node of each userspace's root cartel, -1 for none.
+   // The node of each userspace's root cartel, -1 for none (WorldList
+   // fills the table before gathering).
    int32_t roots[kMaxUserspace + 1];
    // Roots whose userspace ID is beyond the table; each gets a warning
    // once the gathering has gone through.
