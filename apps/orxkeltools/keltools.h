@@ -130,10 +130,12 @@ MallocPtr<T> AllocArray(size_t count) {
 }
 
 // Grows *array to hold at least want elements, doubling so that appends
-// cost amortised constant time; the new elements are zeroed.  False (and
-// the array untouched) on overflow or exhaustion.
+// cost amortised constant time; the new elements are left unset, so the
+// pages behind them are not touched until they are written.  For arrays
+// whose elements are written whole before they are read.  False (and the
+// array untouched) on overflow or exhaustion.
 template <class T>
-bool GrowArray(MallocPtr<T> *array, size_t *capacity, size_t want) {
+bool GrowArrayRaw(MallocPtr<T> *array, size_t *capacity, size_t want) {
    if (want <= *capacity) return true;
    size_t grown = *capacity < 8 ? 8 : *capacity;
    while (grown < want) {
@@ -145,8 +147,17 @@ bool GrowArray(MallocPtr<T> *array, size_t *capacity, size_t want) {
    if (bigger == nullptr) return false;
    (void)array->release();
    array->reset(static_cast<T *>(bigger));
-   std::memset(static_cast<void *>(array->get() + *capacity), 0, (grown - *capacity) * sizeof(T));
    *capacity = grown;
+   return true;
+}
+
+// GrowArrayRaw with the new elements zeroed.
+template <class T>
+bool GrowArray(MallocPtr<T> *array, size_t *capacity, size_t want) {
+   size_t before = *capacity;
+   if (!GrowArrayRaw(array, capacity, want)) return false;
+   if (*capacity > before)
+      std::memset(static_cast<void *>(array->get() + before), 0, (*capacity - before) * sizeof(T));
    return true;
 }
 

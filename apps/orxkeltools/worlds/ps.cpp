@@ -2,14 +2,13 @@
 // table or as one cartel tree per userspace.
 //
 // PsMain turns the options into a set of bits and hands it to WorldList,
-// which gathers every world in one pass over the KEL tree, lays the nodes
-// out in allNodes (each world followed by its zombie children), registers
-// the root cartel of each userspace, links the tree when asked, prints, and
-// releases everything.
+// which gathers every world in one pass over the KEL tree into one node
+// array (each world followed by its zombie children), registering the root
+// cartel of each userspace on the way, links the tree when asked, prints,
+// and releases everything.
 #include <getopt.h>
 
 #include <algorithm>
-#include <cstdarg>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -122,21 +121,23 @@ bool OutOfMemory() {
 
 // A text kept in the text pool.
 struct TextRef {
-   size_t offset;
+   uint32_t offset;
    uint32_t length;
 };
 
-// Names, affinities and command lines of all nodes, back to back in one
-// buffer, so that a node stays small however long its texts are.
+// Names, affinities and command lines of all nodes (the latter two only when
+// their columns are printed), back to back in one buffer, so that a node
+// stays small however long its texts are.  The pool stays within 4 GiB, so
+// a 32-bit offset reaches every text.
 struct TextPool {
    MallocPtr<char> bytes;
    size_t used = 0;
    size_t room = 0;
 
    bool Add(std::string_view text, TextRef *ref) {
-      if (text.size() > SIZE_MAX - used || !GrowArray(&bytes, &room, used + text.size())) return false;
+      if (text.size() > UINT32_MAX - used || !GrowArrayRaw(&bytes, &room, used + text.size())) return false;
       if (!text.empty()) std::memcpy(bytes.get() + used, text.data(), text.size());
-      *ref = {used, uint32_t(text.size())};
+      *ref = {uint32_t(used), uint32_t(text.size())};
       used += text.size();
       return true;
    }
@@ -146,56 +147,56 @@ struct TextPool {
    }
 };
 
-// One row: a kept world, or a zombie child of a cartel.  Links are indexes
-// into allNodes, -1 for none.
+// One row: a kept world, or a zombie child of a cartel.  A world keeps the
+// fields of its information record that the rows print or the tree links
+// by; a zombie has only its IDs, userspace, process group and session.
+// Links are indexes into the node array, -1 for none.
 struct WorldNode {
-   bool schedValid;
-   bool isZombie;
-   uint8_t info[worldinfo::kSize];
+   uint64_t usedTime;
+   uint32_t worldId;
+   uint32_t cartelId;
+   uint32_t parentCartelId;
+   uint32_t userspaceId;
+   uint32_t typeBits;
+   int32_t groupId;
+   int32_t processGroupId;
+   int32_t sessionId;
+   int32_t securityDomain;
    TextRef name;
    TextRef affinity;
    TextRef cmdline;
    uint32_t runState;
    uint32_t waitState;
-   uint64_t usedTime;
    int32_t nChildren;
    int32_t nThreads;
-   int32_t parent;
    int32_t firstChild;
-   int32_t lastChild;
    int32_t nextSibling;
-   // This world's zombies: zombieCount entries of the zombie array from zombieFirst.
-   uint32_t zombieFirst;
-   uint32_t zombieCount;
+   bool schedValid;
+   bool isZombie;
 };
 
 WorldNode NewNode() {
    WorldNode n{};
-   n.parent = n.firstChild = n.lastChild = n.nextSibling = -1;
+   n.firstChild = n.nextSibling = -1;
    return n;
 }
-
-uint32_t WorldId(const WorldNode &n) { return ReadU32(n.info, worldinfo::kWorldId); }
-uint32_t CartelId(const WorldNode &n) { return ReadU32(n.info, worldinfo::kCartelId); }
-uint32_t ParentCartelId(const WorldNode &n) { return ReadU32(n.info, worldinfo::kParentCartelId); }
-uint32_t UserspaceId(const WorldNode &n) { return ReadU32(n.info, worldinfo::kUserspaceId); }
-uint32_t TypeBits(const WorldNode &n) { return ReadU32(n.info, worldinfo::kTypeBits); }
 
 // What WorldList gathers: the nodes, their texts, the userspace roots and
 // the counts the summary prints.  The printing only reads it.
 struct WorldTable {
    uint32_t options = 0;
    TextPool texts;
-   // Kept worlds in instance order, and the zombies they keep.
-   MallocPtr<WorldNode> gathered;
-   size_t gatheredRoom = 0;
-   MallocPtr<WorldNode> zombies;
-   size_t zombieRoom = 0;
-   // Each kept world followed by its zombies, linked into trees on request.
-   MallocPtr<WorldNode> allNodes;
-   uint32_t allCount = 0;
-   // The node in allNodes of each userspace's root cartel, -1 for none.
+   // Each kept world in instance order, directly followed by the zombies
+   // it keeps; linked into trees on request.
+   MallocPtr<WorldNode> nodes;
+   size_t nodeRoom = 0;
+   uint32_t nodeCount = 0;
+   // The node of each userspace's root cartel, -1 for none (WorldList
+   // fills the table before gathering).
    int32_t roots[kMaxUserspace + 1];
+   // Roots whose userspace ID is beyond the table; each gets a warning
+   // once the gathering has gone through.
+   uint32_t rootsBeyondTable = 0;
    KEL_Status latest = KEL_STATUS_OK;
    int totalWorlds = 0;
    int keptWorlds = 0;
@@ -203,6 +204,14 @@ struct WorldTable {
    uint32_t largestWorldId = 0;
    uint32_t longestName = 0;
 };
+
+// Room for one more node at the end of the node array, to be written whole;
+// nullptr when memory runs out or a 32-bit link could no longer reach it.
+WorldNode *AppendNode(WorldTable &t) {
+   if (t.nodeCount >= uint32_t(INT32_MAX) || !GrowArrayRaw(&t.nodes, &t.nodeRoom, size_t(t.nodeCount) + 1))
+      return nullptr;
+   return &t.nodes[t.nodeCount++];
+}
 
 // --- Gathering -------------------------------------------------------------
 
@@ -255,6 +264,10 @@ struct CartelChildren {
    MallocPtr<int32_t> zombieIds;
    size_t zombieIdRoom = 0;
    uint32_t zombieIdCount = 0;
+   // The key list of the children's listings and records, made for the
+   // first cartel and reused: it holds the cartel ID, and the child ID
+   // while that child's record is read.
+   ParamListPtr keys;
 };
 
 bool NoZombieMemory() {
@@ -266,21 +279,24 @@ bool NoZombieMemory() {
 // the listing's status and the zombies among them as a new entry.  A failed
 // listing yields no children.
 bool ReadChildren(CartelChildren &seen, uint32_t cartel) {
-   ParamListPtr childKeys(KEL_ParamListCreate(1, 1));
-   if (!childKeys) {
-      std::fputs("failed to alloc paramlist for children\n", stderr);
-      return false;
+   if (!seen.keys) {
+      seen.keys.reset(KEL_ParamListCreate(1, 1));
+      if (!seen.keys) {
+         std::fputs("failed to alloc paramlist for children\n", stderr);
+         return false;
+      }
    }
-   if (KEL_ParamListAddInt(childKeys.get(), cartel) != KEL_STATUS_OK) {
+   ScopedKey cartelKey(seen.keys.get(), uint64_t(cartel));
+   if (!cartelKey.ok()) {
       std::fputs("failed to add int to child param list\n", stderr);
       return false;
    }
    ParamListPtr children;
-   KEL_Status listStatus = GetInstanceList(KEL_NODE_userworld_cartel_child, childKeys.get(), &children);
+   KEL_Status listStatus = GetInstanceList(KEL_NODE_userworld_cartel_child, seen.keys.get(), &children);
 
    uint32_t count = listStatus == KEL_STATUS_OK ? KEL_ParamListUsedCount(children.get()) : 0;
-   if (!GrowArray(&seen.entries, &seen.entryRoom, size_t(seen.entryCount) + 1) ||
-       (count > 0 && !GrowArray(&seen.zombieIds, &seen.zombieIdRoom, size_t(seen.zombieIdCount) + count)))
+   if (!GrowArrayRaw(&seen.entries, &seen.entryRoom, size_t(seen.entryCount) + 1) ||
+       (count > 0 && !GrowArrayRaw(&seen.zombieIds, &seen.zombieIdRoom, size_t(seen.zombieIdCount) + count)))
       return NoZombieMemory();
    CartelChildren::Entry entry{listStatus, seen.zombieIdCount, 0};
    for (uint32_t i = 0; i < count; i++) {
@@ -289,15 +305,13 @@ bool ReadChildren(CartelChildren &seen, uint32_t cartel) {
          std::fputs("failed to get child ID\n", stderr);
          return false;
       }
-      // The listing's key list, with the child's key for as long as its
-      // record is read: no list per child.
-      ScopedKey childKey(childKeys.get(), uint64_t(int64_t(childId)));
+      ScopedKey childKey(seen.keys.get(), uint64_t(int64_t(childId)));
       if (!childKey.ok()) {
          std::fputs("failed to add child ID to list\n", stderr);
          return false;
       }
       uint8_t child[cartelchild::kSize];
-      KEL_Status status = KEL_Get(KEL_NODE_userworld_cartel_child, childKeys.get(), child, sizeof child);
+      KEL_Status status = KEL_Get(KEL_NODE_userworld_cartel_child, seen.keys.get(), child, sizeof child);
       if (status != KEL_STATUS_OK) {
          std::fprintf(stderr, "failed to get child info for child %d, status %s\n", childId,
                       ORX_ReturnStatusToString(status));
@@ -311,36 +325,18 @@ bool ReadChildren(CartelChildren &seen, uint32_t cartel) {
    return true;
 }
 
-// The children of world w's cartel C: read at the cartel's first world,
-// taken from what was read for the others.  Either way the listing's status
-// becomes the latest status, and w keeps the zombies as nodes when it is the
-// cartel's main world (its world ID is C).
-bool GatherZombies(WorldTable &t, CartelChildren &seen, WorldNode &w, uint32_t cartel) {
+// The children of cartel C: read at the cartel's first world, taken from
+// what was read for the others.  Either way the listing's status becomes the
+// latest status.
+bool FindChildren(WorldTable &t, CartelChildren &seen, uint32_t cartel, CartelChildren::Entry *found) {
    uint32_t *slot = seen.index.Slot(cartel);
    if (slot == nullptr) return NoZombieMemory();
    if (*slot == 0) {
       if (!ReadChildren(seen, cartel)) return false;
       *slot = seen.entryCount;
    }
-   const CartelChildren::Entry &entry = seen.entries[*slot - 1];
-   t.latest = entry.listStatus;
-   if (cartel != WorldId(w) || entry.zombieCount == 0) return true;
-
-   if (!GrowArray(&t.zombies, &t.zombieRoom, size_t(t.zombiesFound) + entry.zombieCount)) return NoZombieMemory();
-   w.zombieFirst = uint32_t(t.zombiesFound);
-   for (uint32_t i = 0; i < entry.zombieCount; i++) {
-      uint32_t childId = uint32_t(seen.zombieIds[entry.firstZombie + i]);
-      WorldNode z = NewNode();
-      z.isZombie = true;
-      PutU32(z.info, worldinfo::kWorldId, childId);
-      PutU32(z.info, worldinfo::kCartelId, childId);
-      PutU32(z.info, worldinfo::kParentCartelId, cartel);
-      std::memcpy(z.info + worldinfo::kUserspaceId, w.info + worldinfo::kUserspaceId, 4);
-      std::memcpy(z.info + worldinfo::kProcessGroupId, w.info + worldinfo::kProcessGroupId, 4);
-      std::memcpy(z.info + worldinfo::kSessionId, w.info + worldinfo::kSessionId, 4);
-      t.zombies[t.zombiesFound++] = z;
-      w.zombieCount++;
-   }
+   *found = seen.entries[*slot - 1];
+   t.latest = found->listStatus;
    return true;
 }
 
@@ -348,12 +344,20 @@ enum class Gathered { Kept, Skipped, Failed };
 
 // Reads the world whose key is on keys into n.  A cartel's command line is
 // read with the cartel ID on cartelKeys, an empty key list of its own.
-Gathered ReadWorld(WorldTable &t, CartelChildren &seen, const KEL_ParamList *keys, KEL_ParamList *cartelKeys,
-                   WorldNode &n) {
-   uint8_t name[kWorldNameSize];
+Gathered ReadWorld(WorldTable &t, const KEL_ParamList *keys, KEL_ParamList *cartelKeys, WorldNode &n) {
+   uint8_t name[kWorldNameSize], info[worldinfo::kSize];
    if (KEL_Get(KEL_NODE_world_name, keys, name, sizeof name) != KEL_STATUS_OK ||
-       KEL_Get(KEL_NODE_world_info, keys, n.info, sizeof n.info) != KEL_STATUS_OK)
+       KEL_Get(KEL_NODE_world_info, keys, info, sizeof info) != KEL_STATUS_OK)
       return Gathered::Skipped;
+   n.worldId = ReadU32(info, worldinfo::kWorldId);
+   n.groupId = ReadI32(info, worldinfo::kGroupId);
+   n.userspaceId = ReadU32(info, worldinfo::kUserspaceId);
+   n.cartelId = ReadU32(info, worldinfo::kCartelId);
+   n.parentCartelId = ReadU32(info, worldinfo::kParentCartelId);
+   n.processGroupId = ReadI32(info, worldinfo::kProcessGroupId);
+   n.sessionId = ReadI32(info, worldinfo::kSessionId);
+   n.typeBits = ReadU32(info, worldinfo::kTypeBits);
+   n.securityDomain = ReadI32(info, worldinfo::kSecurityDomain);
 
    uint8_t summary[summarystats::kSize], cpus[affinity::kSize], times[statetimes::kSize];
    if (KEL_Get(KEL_NODE_sched_Vcpus_stats_summaryStats, keys, summary, sizeof summary) == KEL_STATUS_OK &&
@@ -363,19 +367,21 @@ Gathered ReadWorld(WorldTable &t, CartelChildren &seen, const KEL_ParamList *key
       n.schedValid = true;
    }
 
-   uint32_t cartel = CartelId(n);
+   uint32_t cartel = n.cartelId;
    if ((t.options & kOptUserworlds) && cartel == 0) return Gathered::Skipped;
 
    std::string_view nameText = ReadText(name, 0, sizeof name);
    t.longestName = std::max(t.longestName, uint32_t(nameText.size()));
-   t.largestWorldId = std::max(t.largestWorldId, WorldId(n));
+   t.largestWorldId = std::max(t.largestWorldId, n.worldId);
    if (n.schedValid) {
       n.runState = ReadU32(summary, summarystats::kRunState);
       n.waitState = ReadU32(summary, summarystats::kWaitState);
       n.usedTime = ReadU64(times, statetimes::kUsedTime);
    }
+   // The pool keeps only the texts of the columns asked for.
+   bool keepAffinity = n.schedValid && (t.options & kOptState);
    if (!t.texts.Add(nameText, &n.name) ||
-       (n.schedValid && !t.texts.Add(ReadText(cpus, affinity::kText, sizeof cpus), &n.affinity))) {
+       (keepAffinity && !t.texts.Add(ReadText(cpus, affinity::kText, sizeof cpus), &n.affinity))) {
       OutOfMemory();
       return Gathered::Failed;
    }
@@ -388,18 +394,57 @@ Gathered ReadWorld(WorldTable &t, CartelChildren &seen, const KEL_ParamList *key
                           ? KEL_Get(KEL_NODE_userworld_cartel_cmdline, cartelKeys, cmdline, sizeof cmdline)
                           : KEL_Status(KEL_STATUS_NO_MEMORY);
    t.latest = status;
+   if (!(t.options & kOptCommand)) return Gathered::Kept;
    std::string_view text =
       status == KEL_STATUS_OK ? ReadText(cmdline, 0, sizeof cmdline) : std::string_view("<unavailable>");
    if (!t.texts.Add(text, &n.cmdline)) {
       OutOfMemory();
       return Gathered::Failed;
    }
-   if ((t.options & kOptZombies) && !GatherZombies(t, seen, n, cartel)) return Gathered::Failed;
    return Gathered::Kept;
 }
 
-// Reads every world (with -C, the main world of every cartel) into the
-// gathered array.  False, with a message, when ps must stop.
+// Keeps the world n that ReadWorld read: with -z the children of its cartel
+// are looked up first, then n is appended to the node array, registered as
+// its userspace's root when it is one, and followed by its zombies when it
+// is the main world of its cartel (its world ID is the cartel ID).
+bool KeepWorld(WorldTable &t, CartelChildren &seen, const WorldNode &n) {
+   CartelChildren::Entry children{KEL_STATUS_OK, 0, 0};
+   if ((t.options & kOptZombies) && n.cartelId != 0 && !FindChildren(t, seen, n.cartelId, &children)) return false;
+
+   WorldNode *kept = AppendNode(t);
+   if (kept == nullptr) {
+      std::fputs("WorldList: malloc failed when allocating root tree node\n", stderr);
+      return false;
+   }
+   *kept = n;
+   t.keptWorlds++;
+   if (n.userspaceId != 0 && n.parentCartelId == 0) {
+      if (n.userspaceId > kMaxUserspace)
+         t.rootsBeyondTable++;
+      else
+         t.roots[n.userspaceId] = int32_t(t.nodeCount - 1);
+   }
+
+   if (n.cartelId != n.worldId) return true;
+   for (uint32_t i = 0; i < children.zombieCount; i++) {
+      uint32_t childId = uint32_t(seen.zombieIds[children.firstZombie + i]);
+      WorldNode *z = AppendNode(t);
+      if (z == nullptr) return NoZombieMemory();
+      *z = NewNode();
+      z->isZombie = true;
+      z->worldId = z->cartelId = childId;
+      z->parentCartelId = n.cartelId;
+      z->userspaceId = n.userspaceId;
+      z->processGroupId = n.processGroupId;
+      z->sessionId = n.sessionId;
+      t.zombiesFound++;
+   }
+   return true;
+}
+
+// Reads every world (with -C, the main world of every cartel) into the node
+// array.  False, with a message, when ps must stop.
 bool GatherWorlds(WorldTable &t) {
    ParamListPtr keys(KEL_ParamListCreate(1, 1));
    ParamListPtr cartelKeys(KEL_ParamListCreate(1, 1));
@@ -410,15 +455,8 @@ bool GatherWorlds(WorldTable &t) {
       t.totalWorlds++;
       WorldNode n = NewNode();
       n.nThreads = 1;
-      Gathered result = ReadWorld(t, seen, keys.get(), cartelKeys.get(), n);
-      if (result == Gathered::Kept) {
-         if (!GrowArray(&t.gathered, &t.gatheredRoom, size_t(t.keptWorlds) + 1)) {
-            std::fputs("WorldList: malloc failed when allocating root tree node\n", stderr);
-            result = Gathered::Failed;
-         } else {
-            t.gathered[t.keptWorlds++] = n;
-         }
-      }
+      Gathered result = ReadWorld(t, keys.get(), cartelKeys.get(), n);
+      if (result == Gathered::Kept && !KeepWorld(t, seen, n)) result = Gathered::Failed;
       return result != Gathered::Failed;
    });
    if (walk.end == WalkEnd::ListFailed)
@@ -426,56 +464,25 @@ bool GatherWorlds(WorldTable &t) {
    return walk.end == WalkEnd::Done;
 }
 
-// Lays out allNodes (each kept world followed by its zombies) and registers
-// the root cartel of every userspace.
-bool BuildAllNodes(WorldTable &t) {
-   t.allNodes = AllocArray<WorldNode>(size_t(t.keptWorlds) + size_t(t.zombiesFound));
-   if (!t.allNodes) {
-      std::fputs("WorldList: malloc failed when allocating allNodes list\n", stderr);
-      return false;
-   }
-   std::fill(std::begin(t.roots), std::end(t.roots), -1);
-   uint32_t n = 0;
-   for (int i = 0; i < t.keptWorlds; i++) {
-      const WorldNode &w = t.gathered[i];
-      t.allNodes[n] = w;
-      uint32_t userspace = UserspaceId(w);
-      if (userspace != 0 && ParentCartelId(w) == 0) {
-         if (userspace > kMaxUserspace)
-            std::fputs("Warning: maximum number of userspaces reached...\n", stderr);
-         else
-            t.roots[userspace] = int32_t(n);
-      }
-      n++;
-      for (uint32_t z = 0; z < w.zombieCount; z++) t.allNodes[n++] = t.zombies[w.zombieFirst + z];
-   }
-   t.allCount = n;
-   return true;
-}
-
-// Links every cartel node at the end of its parent's child chain.
+// Links every cartel node into its parent's chain of children.  Going over
+// the nodes backwards and putting each at the front of its parent's chain
+// leaves every chain in node order.
 bool LinkTree(WorldTable &t) {
-   WorldNode *nodes = t.allNodes.get();
-   MallocPtr<psparents::NodeIds> ids = AllocArray<psparents::NodeIds>(t.allCount);
-   MallocPtr<int32_t> parents = AllocArray<int32_t>(t.allCount);
+   WorldNode *nodes = t.nodes.get();
+   MallocPtr<psparents::NodeIds> ids = AllocArray<psparents::NodeIds>(t.nodeCount);
+   MallocPtr<int32_t> parents = AllocArray<int32_t>(t.nodeCount);
    if (!ids || !parents) return OutOfMemory();
-   for (uint32_t i = 0; i < t.allCount; i++)
-      ids[i] = {WorldId(nodes[i]), CartelId(nodes[i]), ParentCartelId(nodes[i])};
-   if (!psparents::FindParents(ids.get(), t.allCount, parents.get())) return OutOfMemory();
+   for (uint32_t i = 0; i < t.nodeCount; i++) ids[i] = {nodes[i].worldId, nodes[i].cartelId, nodes[i].parentCartelId};
+   if (!psparents::FindParents(ids.get(), t.nodeCount, parents.get())) return OutOfMemory();
 
-   for (uint32_t i = 0; i < t.allCount; i++) {
+   for (uint32_t i = t.nodeCount; i-- > 0;) {
       int32_t p = parents[i];
       if (p < 0) continue;
-      WorldNode &child = nodes[i];
       WorldNode &parent = nodes[p];
-      if (parent.firstChild < 0)
-         parent.firstChild = int32_t(i);
-      else
-         nodes[parent.lastChild].nextSibling = int32_t(i);
-      parent.lastChild = int32_t(i);
+      nodes[i].nextSibling = parent.firstChild;
+      parent.firstChild = int32_t(i);
       parent.nChildren++;
-      child.parent = p;
-      if (TypeBits(child) & kCloneWorld) parent.nThreads++;
+      if (nodes[i].typeBits & kCloneWorld) parent.nThreads++;
    }
    return true;
 }
@@ -502,7 +509,7 @@ struct Printer {
    uint32_t requestedUserspace;
    int idWidth = 1;
    int deepest = 0;
-   // Tree layout only: one entry per node of allNodes, and the path from
+   // Tree layout only: one entry per node, and the path from
    // the root to the node being drawn, which grows with the depth.
    MallocPtr<DrawnNode> drawn;
    MallocPtr<PathStep> path;
@@ -510,16 +517,9 @@ struct Printer {
    uint32_t userspace = 0;
 };
 
-// Prints a formatted text followed by spaces up to width characters; a
-// longer text is printed whole.
-__attribute__((format(printf, 2, 3))) void PrintPadded(int width, const char *fmt, ...) {
-   char text[64];
-   va_list ap;
-   va_start(ap, fmt);
-   std::vsnprintf(text, sizeof text, fmt, ap);
-   va_end(ap);
-   std::printf("%-*s", std::max(width, 0), text);
-}
+// Prints two spaces and id, the whole padded with spaces to width
+// characters; a longer text is printed whole.
+void PrintIdColumn(int width, int32_t id) { std::printf("  %-*d", std::max(width - 2, 0), id); }
 
 void PrintPsHeader(const Printer &p) {
    uint32_t o = p.t.options;
@@ -589,12 +589,12 @@ void PrintPsRow(const Printer &p, const WorldNode &n) {
    uint32_t o = t.options;
    int w = p.idWidth, m = int(t.longestName);
    bool zombie = n.isZombie;
-   uint32_t cartel = CartelId(n);
-   PrintPadded(w, "%d", int32_t(WorldId(n)));
+   uint32_t cartel = n.cartelId;
+   std::printf("%-*d", std::max(w, 0), int32_t(n.worldId));
    if (cartel == 0)
       std::printf("%-*s", w + 2, "  0");
    else
-      PrintPadded(w, "  %d", int32_t(cartel));
+      PrintIdColumn(w, int32_t(cartel));
    if (zombie) {
       std::printf("%-*s", m + 2, "  <zombie>");
    } else {
@@ -603,18 +603,18 @@ void PrintPsRow(const Printer &p, const WorldNode &n) {
    }
    if ((o & kOptChildren) && (o & kOptTree) && !zombie) std::printf("  %-9d", n.nChildren);
    if ((o & kOptThreads) && (o & kOptTree) && !zombie) std::printf("  %-8d", n.nThreads);
-   if ((o & kOptGid) && !zombie) PrintPadded(w, "  %d", ReadI32(n.info, worldinfo::kGroupId));
+   if ((o & kOptGid) && !zombie) PrintIdColumn(w, n.groupId);
    if (o & kOptSession) {
       if (cartel == 0) {
          std::printf("%-*s", w, "  0");
          std::printf("%-*s", w, "  0");
       } else {
-         PrintPadded(w - 2, "  %d", ReadI32(n.info, worldinfo::kProcessGroupId));
-         PrintPadded(w - 2, "  %d", ReadI32(n.info, worldinfo::kSessionId));
+         PrintIdColumn(w - 2, n.processGroupId);
+         PrintIdColumn(w - 2, n.sessionId);
       }
    }
-   if (o & kOptPcid) PrintPadded(w + 2, "  %d", int32_t(ParentCartelId(n)));
-   if ((o & kOptType) && !zombie) PrintType(o, TypeBits(n));
+   if (o & kOptPcid) PrintIdColumn(w + 2, int32_t(n.parentCartelId));
+   if ((o & kOptType) && !zombie) PrintType(o, n.typeBits);
    if (o & kOptState) {
       if (zombie || !n.schedValid) {
          std::fputs("                  ", stdout);
@@ -628,8 +628,8 @@ void PrintPsRow(const Printer &p, const WorldNode &n) {
    if ((o & kOptTime) && !zombie && n.schedValid)
       std::printf("  %5llu.%-6llu", static_cast<unsigned long long>(n.usedTime / 1000000),
                   static_cast<unsigned long long>(n.usedTime % 1000000));
-   if ((o & kOptSecurity) && !zombie) std::printf("  %-14d", ReadI32(n.info, worldinfo::kSecurityDomain));
-   if ((o & kOptUserspace) && !zombie) std::printf("  %-9d", int32_t(UserspaceId(n)));
+   if ((o & kOptSecurity) && !zombie) std::printf("  %-14d", n.securityDomain);
+   if ((o & kOptUserspace) && !zombie) std::printf("  %-9d", int32_t(n.userspaceId));
    if ((o & kOptCommand) && cartel != 0 && !zombie) {
       std::string_view cmd = t.texts.Get(n.cmdline);
       std::printf("  %.*s", int(cmd.size()), cmd.data());
@@ -638,17 +638,20 @@ void PrintPsRow(const Printer &p, const WorldNode &n) {
 }
 
 // A glyph of the DEC Special Graphics set, shifted in and out around it.
-void Glyph(char letter) { std::printf("%c%c%c", 14, letter, 15); }
+void Glyph(char letter) {
+   const char shifted[] = {14, letter, 15};
+   std::fwrite(shifted, 1, sizeof shifted, stdout);
+}
 
 // Prints the line of node index at the given depth: its tree prefix and its
 // row.  The first depth steps of the path are its ancestors, root first.
 void PrintTreeLine(Printer &p, int32_t index, size_t depth) {
-   const WorldNode *nodes = p.t.allNodes.get();
+   const WorldNode *nodes = p.t.nodes.get();
    const WorldNode &n = nodes[index];
    p.drawn[index].inTree = p.userspace;
    p.deepest = std::max(p.deepest, int(depth));
    int32_t parent = depth > 0 ? p.path[depth - 1].node : -1;
-   if (depth == 0) std::printf("%d\n", int32_t(UserspaceId(n)));
+   if (depth == 0) std::printf("%d\n", int32_t(n.userspaceId));
    if (parent >= 0) {
       std::fputs("  ", stdout);
       // One column per ancestor below the root: a line while the
@@ -675,7 +678,7 @@ void PrintTreeLine(Printer &p, int32_t index, size_t depth) {
 // drawn whole; a child already drawn in this tree (a cycle in a damaged
 // tree) is passed over.  False when memory for the path runs out.
 bool PrintPsTree(Printer &p, int32_t root) {
-   const WorldNode *nodes = p.t.allNodes.get();
+   const WorldNode *nodes = p.t.nodes.get();
    size_t depth = 0;
    auto enter = [&](int32_t index) {
       PrintTreeLine(p, index, depth);
@@ -727,15 +730,15 @@ bool PrintWorlds(const WorldTable &t, uint32_t requestedUserspace) {
 
    if (!(o & kOptTree)) {
       PrintPsHeader(p);
-      for (uint32_t i = 0; i < t.allCount; i++) {
-         const WorldNode &n = t.allNodes[i];
-         if ((o & kOptUserworlds) && CartelId(n) == 0) continue;
-         if (wanted != 0 && UserspaceId(n) != wanted) continue;
+      for (uint32_t i = 0; i < t.nodeCount; i++) {
+         const WorldNode &n = t.nodes[i];
+         if ((o & kOptUserworlds) && n.cartelId == 0) continue;
+         if (wanted != 0 && n.userspaceId != wanted) continue;
          PrintPsRow(p, n);
       }
       std::fputs("\n", stdout);
    } else {
-      p.drawn = AllocArray<DrawnNode>(t.allCount);
+      p.drawn = AllocArray<DrawnNode>(t.nodeCount);
       if (!p.drawn) return OutOfMemory();
       std::printf("%c)0\n", 27);
       for (uint32_t k = 1; k <= kMaxUserspace; k++) {
@@ -766,7 +769,11 @@ bool PrintWorlds(const WorldTable &t, uint32_t requestedUserspace) {
 bool WorldList(uint32_t options, uint32_t requestedUserspace) {
    WorldTable t;
    t.options = options;
-   if (!GatherWorlds(t) || !BuildAllNodes(t)) return false;
+   std::fill(std::begin(t.roots), std::end(t.roots), -1);
+   if (!GatherWorlds(t)) return false;
+   // A gathering that fails writes no warning about the roots.
+   for (uint32_t i = 0; i < t.rootsBeyondTable; i++)
+      std::fputs("Warning: maximum number of userspaces reached...\n", stderr);
    if ((options & kOptTree) && !LinkTree(t)) return false;
    bool printed = PrintWorlds(t, requestedUserspace);
    return printed && t.latest == KEL_STATUS_OK;
