@@ -28,7 +28,7 @@ namespace kelplat {
 namespace {
 
 constexpr NodeInfo kNodes[] = {
-#define KEL_NODE_DEF(name, number, path, size, flags) {#name, number, path, size, flags},
+#define KEL_NODE_DEF(name, number, path, size, flags) {#name, number, path, size, flags, LevelCount(path)},
 #include "kel/nodes.def"
 #undef KEL_NODE_DEF
 };
@@ -93,11 +93,6 @@ std::span<const NodeInfo> Nodes() { return kNodes; }
 const NodeInfo *FindNode(KEL_Node number) {
    if (number == 0 || number > std::size(kNodes)) return nullptr;
    return &kNodes[number - 1];
-}
-
-unsigned LevelCount(std::string_view path) {
-   return unsigned(std::count(path.begin(), path.end(), '#') +
-                   std::count(path.begin(), path.end(), '$'));
 }
 
 int LevelKind(std::string_view path, unsigned level) {
@@ -271,7 +266,7 @@ KEL_Status KEL_Get(KEL_Node node, const KEL_ParamList *keys, void *buf, uint32_t
    const NodeInfo *info = FindNode(node);
    if (info == nullptr) return KEL_STATUS_INVALID_NODE;
    if (buf == nullptr && size > 0) return KEL_STATUS_BAD_PARAM;
-   if (KeyCount(keys) != LevelCount(info->path)) return KEL_STATUS_BAD_KEY_COUNT;
+   if (KeyCount(keys) != info->levels) return KEL_STATUS_BAD_KEY_COUNT;
    KEL_Status status;
    if (InSimulator()) {
       bool answered = false;
@@ -297,7 +292,7 @@ KEL_Status KEL_Set(KEL_Node node, const KEL_ParamList *keys, const KEL_ParamList
                    uint32_t size) {
    const NodeInfo *info = FindNode(node);
    if (info == nullptr) return KEL_STATUS_INVALID_NODE;
-   if (KeyCount(keys) != LevelCount(info->path)) return KEL_STATUS_BAD_KEY_COUNT;
+   if (KeyCount(keys) != info->levels) return KEL_STATUS_BAD_KEY_COUNT;
    if (!(info->flags & KEL_NF_SET)) return KEL_STATUS_NOT_SUPPORTED;
    // A stored answer wins, so that a snapshot can make any set fail.
    KEL_Status status;
@@ -313,7 +308,7 @@ KEL_Status KEL_GetInstanceListAlloc(KEL_Node node, const KEL_ParamList *keys, KE
    if (info == nullptr) return KEL_STATUS_INVALID_NODE;
    if (list == nullptr) return KEL_STATUS_BAD_PARAM;
    if (!EndsWithLevel(info->path)) return KEL_STATUS_NOT_A_LIST;
-   if (KeyCount(keys) + 1 != LevelCount(info->path)) return KEL_STATUS_BAD_KEY_COUNT;
+   if (KeyCount(keys) + 1 != info->levels) return KEL_STATUS_BAD_KEY_COUNT;
    KEL_Status status;
    CacheHit hit;
    if (!TreeLookup(Op::List, node, keys, &hit, &status)) return status;
@@ -333,7 +328,7 @@ static KEL_Status LookupData(KEL_Node node, const KEL_ParamList *keys, uint32_t 
    const NodeInfo *info = FindNode(node);
    if (info == nullptr) return KEL_STATUS_INVALID_NODE;
    if (!(info->flags & KEL_NF_DATA)) return KEL_STATUS_NOT_SUPPORTED;
-   if (KeyCount(keys) != LevelCount(info->path)) return KEL_STATUS_BAD_KEY_COUNT;
+   if (KeyCount(keys) != info->levels) return KEL_STATUS_BAD_KEY_COUNT;
    KEL_Status status;
    CacheHit hit;
    if (!TreeLookup(Op::Data, node, keys, &hit, &status)) return status;

@@ -18,6 +18,7 @@ struct NodeInfo {
    std::string_view path;   // "world/#/info"
    uint32_t recordSize;
    uint32_t flags;
+   unsigned levels;         // instance levels in the path, counted once
 };
 
 // Every node, in number order (number i is at index i - 1).
@@ -25,7 +26,11 @@ std::span<const NodeInfo> Nodes();
 const NodeInfo *FindNode(KEL_Node number);
 
 // Number of instance levels in a path ("#" and "$" components).
-unsigned LevelCount(std::string_view path);
+constexpr unsigned LevelCount(std::string_view path) {
+   unsigned n = 0;
+   for (char c : path) n += c == '#' || c == '$';
+   return n;
+}
 // Kind of instance level i (0 integer, 1 text), counted from the root.
 int LevelKind(std::string_view path, unsigned level);
 // Whether the path ends with an instance level, so that the node is listed.

@@ -590,16 +590,22 @@ void PrintPsRow(const Printer &p, const WorldNode &n) {
    int w = p.idWidth, m = int(t.longestName);
    bool zombie = n.isZombie;
    uint32_t cartel = n.cartelId;
-   std::printf("%-*d", std::max(w, 0), int32_t(n.worldId));
-   if (cartel == 0)
-      std::printf("%-*s", w + 2, "  0");
-   else
-      PrintIdColumn(w, int32_t(cartel));
-   if (zombie) {
-      std::printf("%-*s", m + 2, "  <zombie>");
-   } else {
+   if (cartel == 0 || zombie) {
+      std::printf("%-*d", std::max(w, 0), int32_t(n.worldId));
+      if (cartel == 0)
+         std::printf("%-*s", w + 2, "  0");
+      else
+         PrintIdColumn(w, int32_t(cartel));
+      if (zombie) std::printf("%-*s", m + 2, "  <zombie>");
+   }
+   if (!zombie) {
+      // The common row: its first three columns in one call.
       std::string_view name = t.texts.Get(n.name);
-      std::printf("  %-*.*s", m, int(name.size()), name.data());
+      if (cartel == 0)
+         std::printf("  %-*.*s", m, int(name.size()), name.data());
+      else
+         std::printf("%-*d  %-*d  %-*.*s", std::max(w, 0), int32_t(n.worldId), std::max(w - 2, 0),
+                     int32_t(cartel), m, int(name.size()), name.data());
    }
    if ((o & kOptChildren) && (o & kOptTree) && !zombie) std::printf("  %-9d", n.nChildren);
    if ((o & kOptThreads) && (o & kOptTree) && !zombie) std::printf("  %-8d", n.nThreads);
@@ -632,16 +638,33 @@ void PrintPsRow(const Printer &p, const WorldNode &n) {
    if ((o & kOptUserspace) && !zombie) std::printf("  %-9d", int32_t(n.userspaceId));
    if ((o & kOptCommand) && cartel != 0 && !zombie) {
       std::string_view cmd = t.texts.Get(n.cmdline);
-      std::printf("  %.*s", int(cmd.size()), cmd.data());
+      std::printf("  %.*s\n", int(cmd.size()), cmd.data());
+      return;
    }
-   std::fputs("\n", stdout);
+   std::putchar('\n');
 }
 
-// A glyph of the DEC Special Graphics set, shifted in and out around it.
-void Glyph(char letter) {
-   const char shifted[] = {14, letter, 15};
-   std::fwrite(shifted, 1, sizeof shifted, stdout);
-}
+// The tree prefix of a line, gathered and written in pieces of up to a few
+// hundred bytes, so that a line costs a few writes however deep it is.
+struct Prefix {
+   char bytes[256];
+   size_t used = 0;
+
+   void Put(const char *text, size_t n) {
+      if (sizeof bytes - used < n) Flush();
+      std::memcpy(bytes + used, text, n);
+      used += n;
+   }
+   // A glyph of the DEC Special Graphics set, shifted in and out around it.
+   void Glyph(char letter) {
+      const char shifted[] = {14, letter, 15};
+      Put(shifted, sizeof shifted);
+   }
+   void Flush() {
+      if (used > 0) std::fwrite(bytes, 1, used, stdout);
+      used = 0;
+   }
+};
 
 // Prints the line of node index at the given depth: its tree prefix and its
 // row.  The first depth steps of the path are its ancestors, root first.
@@ -652,23 +675,25 @@ void PrintTreeLine(Printer &p, int32_t index, size_t depth) {
    p.deepest = std::max(p.deepest, int(depth));
    int32_t parent = depth > 0 ? p.path[depth - 1].node : -1;
    if (depth == 0) std::printf("%d\n", int32_t(n.userspaceId));
+   Prefix prefix;
    if (parent >= 0) {
-      std::fputs("  ", stdout);
+      prefix.Put("  ", 2);
       // One column per ancestor below the root: a line while the
       // ancestor's parent still has children to draw.
       for (size_t i = 1; i < depth; i++) {
          int32_t above = p.path[i - 1].node;
          if (nodes[above].nChildren > 1 && nodes[above].nChildren != p.drawn[above].printedChildren) {
-            Glyph('x');
-            std::putchar(' ');
+            prefix.Glyph('x');
+            prefix.Put(" ", 1);
          } else {
-            std::fputs("  ", stdout);
+            prefix.Put("  ", 2);
          }
       }
    }
    bool last = n.nextSibling < 0 || parent < 0 || nodes[parent].nChildren <= 1;
-   Glyph(last ? 'm' : 't');
-   Glyph('q');
+   prefix.Glyph(last ? 'm' : 't');
+   prefix.Glyph('q');
+   prefix.Flush();
    PrintPsRow(p, n);
    if (parent >= 0) p.drawn[parent].printedChildren++;
 }
