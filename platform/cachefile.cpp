@@ -52,21 +52,36 @@ std::string EncodeLookup(Op op, KEL_Node node, std::span<const Key> keys) {
 }
 
 bool AppendParamLookup(std::string &out, Op op, KEL_Node node, const KEL_ParamList *keys) {
-   out.clear();
-   out.push_back(char(op));
-   out.push_back(char(node & 0xff));
-   out.push_back(char(node >> 8));
+   // The size first, so that the bytes are written in place: the buffer
+   // keeps its room from one call to the next.
+   size_t size = 3;
+   if (keys != nullptr) {
+      for (const KEL_Param &p : keys->entries) {
+         if (p.kind > 0xff) return false;
+         if (p.kind != KEL_PARAM_STRING) {
+            size += 9;
+         } else {
+            if (p.text == nullptr) return false;
+            size += 5 + std::strlen(p.text);
+         }
+      }
+   }
+   out.resize(size);
+   auto *w = reinterpret_cast<uint8_t *>(out.data());
+   *w++ = uint8_t(op);
+   *w++ = uint8_t(node & 0xff);
+   *w++ = uint8_t(node >> 8);
    if (keys == nullptr) return true;
    for (const KEL_Param &p : keys->entries) {
-      if (p.kind > 0xff) return false;
-      out.push_back(char(uint8_t(p.kind)));
+      *w++ = uint8_t(p.kind);
       if (p.kind == KEL_PARAM_STRING) {
-         if (p.text == nullptr) return false;
          size_t n = std::strlen(p.text);
-         AppendU32(out, uint32_t(n));
-         out.append(p.text, n);
+         StoreU32(w, uint32_t(n));
+         std::memcpy(w + 4, p.text, n);
+         w += 4 + n;
       } else {
-         AppendU64(out, p.value);
+         StoreU64(w, p.value);
+         w += 8;
       }
    }
    return true;

@@ -66,10 +66,10 @@ struct Tree {
    std::string lookup;
 };
 
-Tree &TheTree() {
-   static Tree tree;
-   return tree;
-}
+// Set up before any code runs, so that a call needs no guard to reach it.
+constinit Tree gTree;
+
+Tree &TheTree() { return gTree; }
 
 uint32_t KeyCount(const KEL_ParamList *keys) { return KEL_ParamListUsedCount(keys); }
 
