@@ -167,19 +167,21 @@ struct WorldNode {
    TextRef cmdline;
    uint32_t runState;
    uint32_t waitState;
-   int32_t nChildren;
-   int32_t nThreads;
-   int32_t firstChild;
-   int32_t nextSibling;
    bool schedValid;
    bool isZombie;
 };
 
-WorldNode NewNode() {
-   WorldNode n{};
-   n.firstChild = n.nextSibling = -1;
-   return n;
-}
+WorldNode NewNode() { return WorldNode{}; }
+
+// A node's place in its cartel tree, kept apart from the node so that
+// linking and drawing walk a small array.  Links are node indexes, -1 for
+// none.
+struct TreeLink {
+   int32_t firstChild;
+   int32_t nextSibling;
+   int32_t nChildren;
+   int32_t nThreads;
+};
 
 // What WorldList gathers: the nodes, their texts, the userspace roots and
 // the counts the summary prints.  The printing only reads it.
@@ -191,6 +193,8 @@ struct WorldTable {
    MallocPtr<WorldNode> nodes;
    size_t nodeRoom = 0;
    uint32_t nodeCount = 0;
+   // The tree layout's links, one per node.
+   MallocPtr<TreeLink> links;
    // The node of each userspace's root cartel, -1 for none (WorldList
    // fills the table before gathering).
    int32_t roots[kMaxUserspace + 1];
@@ -454,7 +458,6 @@ bool GatherWorlds(WorldTable &t) {
    WalkResult walk = ForEachInstance(listNode, keys.get(), [&](const KEL_Param *) {
       t.totalWorlds++;
       WorldNode n = NewNode();
-      n.nThreads = 1;
       Gathered result = ReadWorld(t, keys.get(), cartelKeys.get(), n);
       if (result == Gathered::Kept && !KeepWorld(t, seen, n)) result = Gathered::Failed;
       return result != Gathered::Failed;
@@ -468,18 +471,21 @@ bool GatherWorlds(WorldTable &t) {
 // the nodes backwards and putting each at the front of its parent's chain
 // leaves every chain in node order.
 bool LinkTree(WorldTable &t) {
-   WorldNode *nodes = t.nodes.get();
+   const WorldNode *nodes = t.nodes.get();
    MallocPtr<psparents::NodeIds> ids = AllocArray<psparents::NodeIds>(t.nodeCount);
    MallocPtr<int32_t> parents = AllocArray<int32_t>(t.nodeCount);
-   if (!ids || !parents) return OutOfMemory();
+   t.links = AllocArray<TreeLink>(t.nodeCount);
+   if (!ids || !parents || !t.links) return OutOfMemory();
    for (uint32_t i = 0; i < t.nodeCount; i++) ids[i] = {nodes[i].worldId, nodes[i].cartelId, nodes[i].parentCartelId};
    if (!psparents::FindParents(ids.get(), t.nodeCount, parents.get())) return OutOfMemory();
 
+   TreeLink *links = t.links.get();
+   for (uint32_t i = 0; i < t.nodeCount; i++) links[i] = {-1, -1, 0, 1};
    for (uint32_t i = t.nodeCount; i-- > 0;) {
       int32_t p = parents[i];
       if (p < 0) continue;
-      WorldNode &parent = nodes[p];
-      nodes[i].nextSibling = parent.firstChild;
+      TreeLink &parent = links[p];
+      links[i].nextSibling = parent.firstChild;
       parent.firstChild = int32_t(i);
       parent.nChildren++;
       if (nodes[i].typeBits & kCloneWorld) parent.nThreads++;
@@ -583,8 +589,10 @@ const char *StateName(const CpuSched_StateElement *table, uint32_t count, uint32
 
 // One row.  The row's ID paddings differ from the header's on purpose, and
 // a column whose condition fails prints nothing, so later columns shift
-// left on zombie rows and on rows without scheduler data.
-void PrintPsRow(const Printer &p, const WorldNode &n) {
+// left on zombie rows and on rows without scheduler data.  link is the
+// node's place in the tree (nullptr in the table layout, which has no -n or
+// -N).
+void PrintPsRow(const Printer &p, const WorldNode &n, const TreeLink *link) {
    const WorldTable &t = p.t;
    uint32_t o = t.options;
    int w = p.idWidth, m = int(t.longestName);
@@ -607,8 +615,8 @@ void PrintPsRow(const Printer &p, const WorldNode &n) {
          std::printf("%-*d  %-*d  %-*.*s", std::max(w, 0), int32_t(n.worldId), std::max(w - 2, 0),
                      int32_t(cartel), m, int(name.size()), name.data());
    }
-   if ((o & kOptChildren) && (o & kOptTree) && !zombie) std::printf("  %-9d", n.nChildren);
-   if ((o & kOptThreads) && (o & kOptTree) && !zombie) std::printf("  %-8d", n.nThreads);
+   if ((o & kOptChildren) && (o & kOptTree) && !zombie) std::printf("  %-9d", link->nChildren);
+   if ((o & kOptThreads) && (o & kOptTree) && !zombie) std::printf("  %-8d", link->nThreads);
    if ((o & kOptGid) && !zombie) PrintIdColumn(w, n.groupId);
    if (o & kOptSession) {
       if (cartel == 0) {
@@ -669,8 +677,8 @@ struct Prefix {
 // Prints the line of node index at the given depth: its tree prefix and its
 // row.  The first depth steps of the path are its ancestors, root first.
 void PrintTreeLine(Printer &p, int32_t index, size_t depth) {
-   const WorldNode *nodes = p.t.nodes.get();
-   const WorldNode &n = nodes[index];
+   const WorldNode &n = p.t.nodes[index];
+   const TreeLink *links = p.t.links.get();
    p.drawn[index].inTree = p.userspace;
    p.deepest = std::max(p.deepest, int(depth));
    int32_t parent = depth > 0 ? p.path[depth - 1].node : -1;
@@ -682,7 +690,7 @@ void PrintTreeLine(Printer &p, int32_t index, size_t depth) {
       // ancestor's parent still has children to draw.
       for (size_t i = 1; i < depth; i++) {
          int32_t above = p.path[i - 1].node;
-         if (nodes[above].nChildren > 1 && nodes[above].nChildren != p.drawn[above].printedChildren) {
+         if (links[above].nChildren > 1 && links[above].nChildren != p.drawn[above].printedChildren) {
             prefix.Glyph('x');
             prefix.Put(" ", 1);
          } else {
@@ -690,11 +698,11 @@ void PrintTreeLine(Printer &p, int32_t index, size_t depth) {
          }
       }
    }
-   bool last = n.nextSibling < 0 || parent < 0 || nodes[parent].nChildren <= 1;
+   bool last = links[index].nextSibling < 0 || parent < 0 || links[parent].nChildren <= 1;
    prefix.Glyph(last ? 'm' : 't');
    prefix.Glyph('q');
    prefix.Flush();
-   PrintPsRow(p, n);
+   PrintPsRow(p, n, &links[index]);
    if (parent >= 0) p.drawn[parent].printedChildren++;
 }
 
@@ -703,13 +711,13 @@ void PrintTreeLine(Printer &p, int32_t index, size_t depth) {
 // drawn whole; a child already drawn in this tree (a cycle in a damaged
 // tree) is passed over.  False when memory for the path runs out.
 bool PrintPsTree(Printer &p, int32_t root) {
-   const WorldNode *nodes = p.t.nodes.get();
+   const TreeLink *links = p.t.links.get();
    size_t depth = 0;
    auto enter = [&](int32_t index) {
       PrintTreeLine(p, index, depth);
-      if (nodes[index].firstChild < 0) return true;
+      if (links[index].firstChild < 0) return true;
       if (!GrowArray(&p.path, &p.pathRoom, depth + 1)) return false;
-      p.path[depth++] = {index, nodes[index].firstChild};
+      p.path[depth++] = {index, links[index].firstChild};
       return true;
    };
    if (!enter(root)) return false;
@@ -720,7 +728,7 @@ bool PrintPsTree(Printer &p, int32_t root) {
          depth--;
          continue;
       }
-      step.nextChild = nodes[child].nextSibling;
+      step.nextChild = links[child].nextSibling;
       if (p.drawn[child].inTree == p.userspace)
          p.drawn[step.node].printedChildren++;
       else if (!enter(child))
@@ -759,7 +767,7 @@ bool PrintWorlds(const WorldTable &t, uint32_t requestedUserspace) {
          const WorldNode &n = t.nodes[i];
          if ((o & kOptUserworlds) && n.cartelId == 0) continue;
          if (wanted != 0 && n.userspaceId != wanted) continue;
-         PrintPsRow(p, n);
+         PrintPsRow(p, n, nullptr);
       }
       std::fputs("\n", stdout);
    } else {
@@ -824,7 +832,9 @@ bool FindParents(const NodeIds *nodes, uint32_t count, int32_t *parents) {
       return a.worldId != b.worldId ? a.worldId < b.worldId : a.node < b.node;
    };
    Candidate *begin = candidates.get(), *end = begin + used;
-   std::sort(begin, end, byWorldThenNode);
+   // Worlds are usually listed in ID order: then the candidates are sorted
+   // already.
+   if (!std::is_sorted(begin, end, byWorldThenNode)) std::sort(begin, end, byWorldThenNode);
    for (uint32_t i = 0; i < count; i++) {
       parents[i] = -1;
       if (nodes[i].cartelId == 0) continue;
