@@ -149,9 +149,13 @@ Key MetaKey(std::string_view name) { return Key{KEL_PARAM_STRING, 0, std::string
 
 class Builder {
 public:
+   // Entries go to cache->writer; the header's fields to the others.
+   explicit Builder(SnapshotCache &cache) : cache_(cache) {
+      cache_.signature = DefaultSignature();
+      cache_.buildDate = "unknown";
+   }
    // A member of the snapshot's top level; "tree" is walked by Walk.
    void TopMember(const std::string &name, Json &value);
-   std::string Finish() const { return writer_.Finish(signature_, date_); }
 
    // The value at a position: a record, a data content, an object of
    // instances, or an object of fixed names.  null stores nothing.
@@ -193,26 +197,21 @@ public:
    void EndLevel(const Level &level, const std::string &path);
 
 private:
-   void Add(std::string lookup, uint32_t status, std::string data, const std::string &path) {
+   void Add(std::string_view lookup, uint32_t status, std::string_view data, const std::string &path) {
       // Each record and content is capped; so is their sum, so that no
       // snapshot makes a file of gigabytes.
       total_ += lookup.size() + data.size();
       if (total_ > kMaxCacheSize) Fail(path, "makes the cache file larger than 256 MiB");
-      // Records are made at their node's full size and then trimmed; the
-      // stored entry keeps only the bytes, not the spare capacity.
-      if (data.capacity() > data.size() + 64) data.shrink_to_fit();
-      if (!writer_.Add(std::move(lookup), status, std::move(data)))
+      if (!cache_.writer.Add(lookup, status, data))
          Fail(path, "makes an entry that another member made already");
    }
    void Simulator(const Json &value, const std::string &path);
    void RawEntries(const Json &value, const std::string &path);
 
    const NodeTree &tree_ = TheNodeTree();
-   kelplat::CacheWriter writer_;
+   SnapshotCache &cache_;
    std::vector<Key> keys_;  // the instance keys down to the current position
    uint64_t total_ = 0;
-   std::string date_ = "unknown";
-   std::array<uint8_t, 16> signature_ = DefaultSignature();
 };
 
 void Builder::TopMember(const std::string &name, Json &value) {
@@ -221,11 +220,11 @@ void Builder::TopMember(const std::string &name, Json &value) {
       std::string date = ReadText(value, p);
       if (date.size() > kelplat::kBuildDateMax) Fail(p, "longer than 20 characters");
       if (date.find('\0') != std::string::npos) Fail(p, "contains a NUL");
-      date_ = std::move(date);
+      cache_.buildDate = std::move(date);
    } else if (name == "signature") {
       std::string bytes = ReadHex(value, p);
-      if (bytes.size() != signature_.size()) Fail(p, "expected 32 hex digits");
-      std::copy(bytes.begin(), bytes.end(), signature_.begin());
+      if (bytes.size() != cache_.signature.size()) Fail(p, "expected 32 hex digits");
+      std::copy(bytes.begin(), bytes.end(), cache_.signature.begin());
    } else if (name == "tree") {
       Walk(0, value, p, false);
    } else if (name == "simulator") {
@@ -403,10 +402,9 @@ class StreamingReader {
 public:
    explicit StreamingReader(Builder &builder) : builder_(builder) {}
 
-   // The cache file, once the parser has read the whole text.
-   std::string Finish() {
+   // Once the parser has read the whole text: the walk's first mistake.
+   void Finish() {
       if (failed_) throw firstError_;
-      return builder_.Finish();
    }
 
    bool null() { return Forward([&] { value_.null(); }); }
@@ -542,18 +540,17 @@ std::string WithoutTag(std::string_view what) {
 
 }  // namespace kelcache
 
-bool BuildCache(const std::string &jsonText, std::string *cacheBytes, std::string *error) {
+bool ReadSnapshot(const std::string &jsonText, SnapshotCache *cache, std::string *error) {
    using namespace kelcache;
    std::string message;
    try {
       if (!TheNodeTree().error.empty()) {
          message = "node table: " + TheNodeTree().error;
       } else {
-         Builder builder;
+         Builder builder(*cache);
          StreamingReader reader(builder);
          Json::sax_parse(jsonText, &reader);
-         std::string bytes = reader.Finish();
-         if (cacheBytes != nullptr) *cacheBytes = std::move(bytes);
+         reader.Finish();
          return true;
       }
    } catch (const SnapshotError &e) {
@@ -569,4 +566,17 @@ bool BuildCache(const std::string &jsonText, std::string *cacheBytes, std::strin
    }
    if (error != nullptr) *error = message;
    return false;
+}
+
+bool BuildCache(const std::string &jsonText, std::string *cacheBytes, std::string *error) {
+   SnapshotCache cache;
+   if (!ReadSnapshot(jsonText, &cache, error)) return false;
+   try {
+      std::string bytes = cache.writer.Finish(cache.signature, cache.buildDate);
+      if (cacheBytes != nullptr) *cacheBytes = std::move(bytes);
+      return true;
+   } catch (const std::bad_alloc &) {
+      if (error != nullptr) *error = "out of memory";
+      return false;
+   }
 }
