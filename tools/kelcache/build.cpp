@@ -4,6 +4,7 @@
 #include <memory>
 #include <unordered_set>
 
+#include "byteset.h"
 #include "content.h"
 #include "nodetree.h"
 #include "records.h"
@@ -69,7 +70,7 @@ private:
       bool operator()(size_t a, size_t b) const { return Name(*members, a) == Name(*members, b); }
    };
    using IndexSet = std::unordered_set<size_t, IndexHash, IndexEqual>;
-   static constexpr size_t kLinearMembers = 8;
+   static constexpr size_t kLinearMembers = 16;
 
    struct Frame {
       Json *container;
@@ -183,7 +184,7 @@ public:
       std::optional<uint32_t> listStatus;
       bool noListing = false;
       std::vector<Key> listed;
-      std::unordered_set<std::string> seen;  // encoded keys
+      ByteSet seen;  // encoded keys
    };
    // The level below pos, or nothing when pos has fixed names.
    std::optional<Level> StartLevel(int pos) const {
@@ -210,6 +211,7 @@ private:
 
    const NodeTree &tree_ = TheNodeTree();
    SnapshotCache &cache_;
+   RecordEncoder records_;
    std::vector<Key> keys_;  // the instance keys down to the current position
    uint64_t total_ = 0;
 };
@@ -248,8 +250,8 @@ void Builder::Walk(int pos, Json &value, const std::string &path, bool instance)
       // A listed instance given as {} has nothing to read: its read answers
       // Not found, as one given as null.
       if (instance && IsEmptyInstance(value)) return;
-      RecordEntry r = EncodeRecord(*at.node, value, path, instance);
-      Add(kelplat::EncodeLookup(Op::Get, at.node->number, keys_), r.status, std::move(r.data), path);
+      RecordEntry r = records_.Encode(*at.node, value, path, instance);
+      Add(kelplat::EncodeLookup(Op::Get, at.node->number, keys_), r.status, r.data, path);
       if (r.setStatus) Add(kelplat::EncodeLookup(Op::Set, at.node->number, keys_), *r.setStatus, "", path);
       return;
    }
@@ -285,7 +287,7 @@ void Builder::LevelMember(Level &l, const std::string &name, Json &value, const 
    Key key = ParseKeyName(name, tree_.at(l.level).levelKind, p);
    std::string encoded;
    kelplat::AppendKey(encoded, key);
-   if (!l.seen.insert(encoded).second) Fail(p, "the same instance key as an earlier member");
+   if (!l.seen.Insert(encoded).second) Fail(p, "the same instance key as an earlier member");
    if (unlisted) unlisted = ReadBool(value.at("$unlisted"), MemberPath(p, "$unlisted"));
    if (!unlisted) l.listed.push_back(key);
    keys_.push_back(std::move(key));
@@ -371,26 +373,6 @@ void Builder::RawEntries(const Json &value, const std::string &path) {
    }
 }
 
-// Member names of one object, for a member given twice: a hash once the
-// object has more than a few.
-class NameSet {
-public:
-   bool Insert(const std::string &name) {
-      if (!hashed_.empty()) return hashed_.insert(name).second;
-      if (std::find(few_.begin(), few_.end(), name) != few_.end()) return false;
-      few_.push_back(name);
-      if (few_.size() > 8) {
-         hashed_.insert(few_.begin(), few_.end());
-         few_.clear();
-      }
-      return true;
-   }
-
-private:
-   std::vector<std::string> few_;
-   std::unordered_set<std::string> hashed_;
-};
-
 // Reads the snapshot and walks it as it is read.  The objects above the
 // instances (the top level, "tree", its fixed names and the objects of
 // instances) are taken member by member, and only one member's value at a
@@ -437,7 +419,7 @@ private:
       int pos;           // its position (Fixed, Level)
       std::string path;  // its JSON path
       std::optional<Builder::Level> level;
-      NameSet names;
+      ByteSet names;  // for a member given twice
       std::string key, memberPath;  // the member being read
       int child = -1;                // its position (Fixed)
    };
@@ -498,7 +480,7 @@ bool StreamingReader::OpenFrame() {
 bool StreamingReader::key(std::string &name) {
    if (!value_.Idle()) return value_.key(name);
    Frame &f = frames_.back();
-   if (!f.names.Insert(name)) Fail(MemberPath(f.path, name), "member given twice");
+   if (!f.names.Insert(name).second) Fail(MemberPath(f.path, name), "member given twice");
    f.key = std::move(name);
    f.memberPath = MemberPath(f.path, f.key);
    if (f.kind == Kind::Fixed) Walk([&] { f.child = builder_.FixedMember(f.pos, f.key, f.memberPath); });

@@ -177,6 +177,7 @@ private:
    void Emit(int pos, const Place *place, bool unlisted, std::string &out, int depth) const;
 
    const NodeTree &tree_ = TheNodeTree();
+   mutable RecordEncoder records_;  // scratch space
    Place root_;
    Json simulator_ = Json::object();
 };
@@ -280,7 +281,7 @@ bool Dumper::PlaceRead(const Entry &e, const Lookup &l) {
       if (!(node->flags & kelplat::KEL_NF_DATA) || !DumpData(e.status, e.data, true)) return false;
    } else {
       if (node->recordSize == 0 || (node->flags & kelplat::KEL_NF_DATA)) return false;
-      if (!DumpRecord(*node, {e.status, std::string(e.data), {}}, true)) return false;
+      if (!DumpRecord(*node, {e.status, e.data, {}}, true, records_)) return false;
    }
    if (!Representable(pos, l.keys)) return false;
    Place *place = Reach(pos, l.keys, true);
@@ -370,9 +371,9 @@ void Dumper::Emit(int pos, const Place *place, bool unlisted, std::string &out, 
    if (at.node != nullptr && at.node->recordSize > 0) {
       Json j = nullptr;
       if (place != nullptr && place->get != nullptr) {
-         RecordEntry r{place->get->status, std::string(place->get->data), {}};
+         RecordEntry r{place->get->status, place->get->data, {}};
          if (place->set != nullptr) r.setStatus = place->set->status;
-         j = DumpRecord(*at.node, r, unlisted).value_or(nullptr);
+         j = DumpRecord(*at.node, r, unlisted, records_).value_or(nullptr);
       }
       AppendJson(out, unlisted ? MarkUnlisted(j) : j, depth);
       return;

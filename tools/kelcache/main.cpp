@@ -224,8 +224,9 @@ int Build(Args args) {
       std::fprintf(stderr, "kelcache: %s\n", problem.c_str());
       return 1;
    }
-   // The text is no longer needed: its memory serves the writing.
-   json = std::string();
+   // The text is no longer needed: its memory serves the writing (a swap,
+   // as assigning an empty string would keep the capacity).
+   std::string().swap(json);
    auto fill = [&cache](int fd) {
       try {
          return cache.writer.WriteTo(fd, cache.signature, cache.buildDate);

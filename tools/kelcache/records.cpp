@@ -165,44 +165,10 @@ IntType IntTypeOf(FieldType type) {
    }
 }
 
-void PutUint(std::string &buf, size_t offset, size_t size, uint64_t v) {
-   for (size_t i = 0; i < size; i++) buf[offset + i] = char(uint8_t(v >> (8 * i)));
-}
-
 uint64_t GetUint(std::string_view buf, size_t offset, size_t size) {
    uint64_t v = 0;
    for (size_t i = 0; i < size; i++) v |= uint64_t(uint8_t(buf[offset + i])) << (8 * i);
    return v;
-}
-
-void PutBytes(std::string &buf, const Field &f, std::string_view bytes, const std::string &path) {
-   if (bytes.size() > f.width)
-      Fail(path, std::to_string(bytes.size()) + " bytes do not fit the field's " + std::to_string(f.width));
-   std::copy(bytes.begin(), bytes.end(), buf.begin() + f.offset);
-}
-
-// Lays one field over buf.  A text writes its bytes and, when it is shorter
-// than the field, one NUL: any other bytes come from "$raw".
-void PutField(std::string &buf, const Field &f, const Json &value, const std::string &path) {
-   switch (f.type) {
-   case Text: {
-      const std::string &text = ReadText(value, path);
-      if (text.size() > f.width)
-         Fail(path, "text of " + std::to_string(text.size()) + " bytes is longer than the field (" +
-                       std::to_string(f.width) + " bytes)");
-      std::copy(text.begin(), text.end(), buf.begin() + f.offset);
-      if (text.size() < f.width) buf[f.offset + text.size()] = '\0';
-      return;
-   }
-   case Hex:
-   case Mac: PutBytes(buf, f, ReadHex(value, path), path); return;
-   default: PutUint(buf, f.offset, FieldSize(f), ReadInt(value, IntTypeOf(f.type), path));
-   }
-}
-
-void TrimZeros(std::string &bytes) {
-   size_t end = bytes.find_last_not_of('\0');
-   bytes.resize(end == std::string::npos ? 0 : end + 1);
 }
 
 std::string_view TrimmedZeros(std::string_view bytes) {
@@ -259,14 +225,56 @@ const RecordDef *FindRecord(KEL_Node number) {
    return nullptr;
 }
 
-RecordEntry EncodeRecord(const kelplat::NodeInfo &node, const Json &value, const std::string &path,
-                         bool allowUnlisted) {
+void RecordEncoder::Clear(size_t n) {
+   std::fill(buf_.begin(), buf_.begin() + ptrdiff_t(std::min(dirty_, buf_.size())), '\0');
+   dirty_ = 0;
+   if (buf_.size() < n) buf_.resize(n, '\0');
+}
+
+void RecordEncoder::PutUint(size_t offset, size_t size, uint64_t v) {
+   Mark(offset + size);
+   for (size_t i = 0; i < size; i++) buf_[offset + i] = char(uint8_t(v >> (8 * i)));
+}
+
+void RecordEncoder::PutBytes(const Field &f, std::string_view bytes, const std::string &path) {
+   if (bytes.size() > f.width)
+      Fail(path, std::to_string(bytes.size()) + " bytes do not fit the field's " + std::to_string(f.width));
+   Mark(f.offset + bytes.size());
+   std::copy(bytes.begin(), bytes.end(), buf_.begin() + f.offset);
+}
+
+// Lays one field over the buffer.  A text writes its bytes and, when it is
+// shorter than the field, one NUL: any other bytes come from "$raw".
+void RecordEncoder::PutField(const Field &f, const Json &value, const std::string &path) {
+   switch (f.type) {
+   case Text: {
+      const std::string &text = ReadText(value, path);
+      if (text.size() > f.width)
+         Fail(path, "text of " + std::to_string(text.size()) + " bytes is longer than the field (" +
+                       std::to_string(f.width) + " bytes)");
+      Mark(f.offset + std::min<size_t>(text.size() + 1, f.width));
+      std::copy(text.begin(), text.end(), buf_.begin() + f.offset);
+      if (text.size() < f.width) buf_[f.offset + text.size()] = '\0';
+      return;
+   }
+   case Hex:
+   case Mac: PutBytes(f, ReadHex(value, path), path); return;
+   default: PutUint(f.offset, FieldSize(f), ReadInt(value, IntTypeOf(f.type), path));
+   }
+}
+
+std::string_view RecordEncoder::Trimmed(size_t n) const {
+   return TrimmedZeros(std::string_view(buf_).substr(0, std::min(n, dirty_)));
+}
+
+RecordEntry RecordEncoder::Encode(const kelplat::NodeInfo &node, const Json &value, const std::string &path,
+                                  bool allowUnlisted) {
    const RecordDef &def = *FindRecord(node.number);
    RecordEntry out;
    if (value.is_string() && (def.flags & kWholeText)) {
-      out.data.assign(node.recordSize, '\0');
-      PutField(out.data, def.fields[0], value, path);
-      TrimZeros(out.data);
+      Clear(node.recordSize);
+      PutField(def.fields[0], value, path);
+      out.data = Trimmed(node.recordSize);
       return out;
    }
    if (!value.is_object())
@@ -318,8 +326,9 @@ RecordEntry EncodeRecord(const kelplat::NodeInfo &node, const Json &value, const
    if (raw.size() > stored)
       Fail(rawPath, std::to_string(raw.size()) + " bytes do not fit a record of " + std::to_string(stored) +
                        " bytes");
-   std::string buf(std::max<size_t>(stored, node.recordSize), '\0');
-   std::copy(raw.begin(), raw.end(), buf.begin());
+   Clear(std::max<size_t>(stored, node.recordSize));
+   Mark(raw.size());
+   std::copy(raw.begin(), raw.end(), buf_.begin());
    bool haveLength = false, haveLinkState = false;
    std::optional<size_t> tableSize;
    for (const Given &g : given) {
@@ -328,38 +337,39 @@ RecordEntry EncodeRecord(const kelplat::NodeInfo &node, const Json &value, const
       if ((def.flags & kAcpiBuffer) && g.field->name == "data") {
          if (tableText != nullptr) Fail(tableTextPath, "give data or text, not both");
          std::string bytes = ReadHex(*g.value, g.path);
-         PutBytes(buf, *g.field, bytes, g.path);
+         PutBytes(*g.field, bytes, g.path);
          tableSize = bytes.size();
       } else {
-         PutField(buf, *g.field, *g.value, g.path);
+         PutField(*g.field, *g.value, g.path);
       }
    }
    if (tableText != nullptr) {
       const std::string &text = ReadText(*tableText, tableTextPath);
-      PutBytes(buf, *FindField(def, "data"), text, tableTextPath);
+      PutBytes(*FindField(def, "data"), text, tableTextPath);
       tableSize = text.size();
    }
    // Only table bytes given set the default length; "$raw" bytes stay as they are.
-   if ((def.flags & kAcpiBuffer) && !haveLength && tableSize) PutUint(buf, 5, 4, *tableSize);
+   if ((def.flags & kAcpiBuffer) && !haveLength && tableSize) PutUint(5, 4, *tableSize);
    if (unlinked != nullptr && ReadBool(*unlinked, unlinkedPath)) {
       if (haveLinkState) Fail(unlinkedPath, "give linkState or unlinked, not both");
-      PutUint(buf, 20, 4, uint32_t(-4));
+      PutUint(20, 4, uint32_t(-4));
    }
-   buf.resize(stored);
-   if (!size) TrimZeros(buf);  // the reader zero-fills short records
-   out.data = std::move(buf);
+   // The reader zero-fills short records, so without "$size" the zeros at
+   // the end are left out.
+   out.data = size ? std::string_view(buf_).substr(0, stored) : Trimmed(stored);
    return out;
 }
 
-std::optional<Json> DumpRecord(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject) {
+std::optional<Json> DumpRecord(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject,
+                               RecordEncoder &encoder) {
    const RecordDef &def = *FindRecord(node.number);
-   std::string buf = entry.data;
+   std::string buf(entry.data);
    if (buf.size() < node.recordSize) buf.resize(node.recordSize, '\0');
    // A failing read usually stores no bytes; then it needs no fields either.
    Json fields = entry.data.empty() && entry.status != 0 ? Json::object() : DecodeFields(def, buf);
    auto encodesBack = [&](const Json &j) {
       try {
-         return EncodeRecord(node, j, "", false).data == entry.data;
+         return encoder.Encode(node, j, "", false).data == entry.data;
       } catch (const SnapshotError &) {
          return false;
       }

@@ -2,6 +2,7 @@
 #ifndef KELCACHE_RECORDS_H
 #define KELCACHE_RECORDS_H
 
+#include <algorithm>
 #include <cstdint>
 #include <optional>
 #include <span>
@@ -40,16 +41,38 @@ const RecordDef *FindRecord(KEL_Node node);
 // A record as stored: read status, bytes, and the answer to KEL_Set when given.
 struct RecordEntry {
    uint32_t status = 0;
-   std::string data;
+   std::string_view data;
    std::optional<uint32_t> setStatus;
 };
 
-// The record at path.  "$unlisted" is skipped when allowUnlisted.
-RecordEntry EncodeRecord(const kelplat::NodeInfo &node, const Json &value, const std::string &path,
-                         bool allowUnlisted);
+// Lays records out in one buffer kept from record to record, so that a
+// record costs the bytes its fields fill, not its node's full size (a file
+// descriptor's record is 2 KiB, mostly zeros that are trimmed away).
+class RecordEncoder {
+public:
+   // The record at path.  "$unlisted" is skipped when allowUnlisted.  Its
+   // data views this encoder's buffer until the next call.
+   RecordEntry Encode(const kelplat::NodeInfo &node, const Json &value, const std::string &path,
+                      bool allowUnlisted);
+
+private:
+   // Room for n bytes, all zero.
+   void Clear(size_t n);
+   void Mark(size_t end) { dirty_ = std::max(dirty_, end); }
+   void PutUint(size_t offset, size_t size, uint64_t v);
+   void PutBytes(const Field &f, std::string_view bytes, const std::string &path);
+   void PutField(const Field &f, const Json &value, const std::string &path);
+   // The first n bytes without the zeros that end them.
+   std::string_view Trimmed(size_t n) const;
+
+   std::string buf_;
+   size_t dirty_ = 0;  // every byte from here on is zero
+};
+
 // The JSON that encodes back to exactly this entry, or nothing when there is
-// none.  asObject: never a plain string.
-std::optional<Json> DumpRecord(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject);
+// none.  asObject: never a plain string.  encoder is scratch space.
+std::optional<Json> DumpRecord(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject,
+                               RecordEncoder &encoder);
 
 }  // namespace kelcache
 
