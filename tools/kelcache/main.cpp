@@ -260,12 +260,11 @@ int Dump(Args args) {
    // The dump verifies the whole file itself.
    kelplat::CacheReader reader;
    if (!OpenCache(path, kelplat::kCacheQuickOpen, &reader)) return 1;
-   std::string json, error;
-   if (!DumpCache(reader.Bytes(), &json, &error)) {
+   std::string error;
+   if (!DumpCacheTo(reader.Bytes(), stdout, &error)) {
       std::fprintf(stderr, "kelcache: %s: %s\n", path, error.c_str());
       return 1;
    }
-   std::fwrite(json.data(), 1, json.size(), stdout);
    return Flushed();
 }
 

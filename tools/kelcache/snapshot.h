@@ -5,6 +5,7 @@
 
 #include <array>
 #include <cstdint>
+#include <cstdio>
 #include <string>
 #include <string_view>
 
@@ -33,5 +34,9 @@ bool BuildCache(const std::string &jsonText, std::string *cacheBytes, std::strin
 // file BuildCache made.  A damaged file makes *error the text of its cache
 // status ("Corrupt cache file").
 bool DumpCache(std::string_view cacheBytes, std::string *jsonText, std::string *error);
+// The same, written to file as it is made.  A damaged file is found before
+// anything is written.  A failed write does not stop the dump: the file's
+// error flag tells, and errno is that write's.
+bool DumpCacheTo(std::string_view cacheBytes, FILE *file, std::string *error);
 
 #endif
