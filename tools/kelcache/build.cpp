@@ -211,7 +211,7 @@ private:
 
    const NodeTree &tree_ = TheNodeTree();
    SnapshotCache &cache_;
-   RecordEncoder records_;
+   RecordCodec records_;
    std::vector<Key> keys_;  // the instance keys down to the current position
    uint64_t total_ = 0;
 };

@@ -1,12 +1,17 @@
 // Cache file bytes to snapshot JSON.
 //
-// Entries are taken in the order of their keys and first gathered into a
-// tree of places mirroring the snapshot's "tree"; that tree is then written
-// out, listed instances in listing order.  An entry that the tree cannot
-// give back byte for byte goes to "rawEntries".  A place is a small record in
-// one array that names its entries by slot and its instance key by where
-// the key lies in the file, and the text goes out as it is made, so that
-// memory stays near the size of the file.
+// Entries are first gathered into a tree of places mirroring the snapshot's
+// "tree"; that tree is then written out, listed instances in listing order
+// and the others in the order of their keys.  An entry that the tree cannot
+// give back byte for byte goes to "rawEntries".
+//
+// A place is a small record in one array that names its entries by slot and
+// its instance key by where the key lies in the file, and the text goes out
+// as it is made, so that memory stays near the size of the file.  Entries
+// are placed in the order of their slots, in which the entries of one
+// instance lie side by side; each place keeps the rank (in key order) of the
+// first entry that reached it, which orders the instances as if the entries
+// had been placed in key order.
 #include <algorithm>
 #include <cerrno>
 #include <cstdio>
@@ -199,11 +204,14 @@ private:
 };
 
 // What was found at one position for one set of instance keys: the root, a
-// fixed name or an instance.  Children are a list, in the order they were
-// made once placing is done; instances are also found through a hash.
+// fixed name or an instance.  Children are a list, in the order of their
+// ranks once placing is done; instances are also found through a hash.
 struct Place {
    uint32_t firstChild = 0, nextSibling = 0;  // 0: none (the root is nobody's child)
    uint32_t parent = 0;
+   // The first entry to reach this place: listings before reads, each in
+   // key order.
+   uint32_t rank = kNone;
    // The slot of the read or data content here, or of the listing of the
    // instances below.
    uint32_t entry = kNone;
@@ -221,13 +229,15 @@ public:
 
 private:
    Entry EntryOfSlot(uint32_t slot) const;
-   bool SortSlots();
-   bool PlaceListing(const Entry &e, const Lookup &l, uint32_t slot);
-   bool PlaceRead(const Entry &e, const Lookup &l, uint32_t slot);
+   bool RankEntries();
+   bool PlaceListing(const Entry &e, const Lookup &l, uint32_t slot, uint32_t rank);
+   bool PlaceRead(const Entry &e, const Lookup &l, uint32_t slot, uint32_t rank);
    bool PlaceSet(const Entry &e, const Lookup &l, uint32_t slot);
    bool PlaceMeta(const Entry &e, const Lookup &l);
    static bool Representable(const std::vector<std::string_view> &keys);
-   uint32_t Reach(int pos, const std::vector<std::string_view> &keys, bool create);
+   // The place at pos for keys; created, and its rank and those of the
+   // places above it lowered to rank, unless rank is kNone.
+   uint32_t Reach(int pos, const std::vector<std::string_view> &keys, uint32_t rank);
    uint32_t FixedChild(uint32_t place, int pos) const;
    uint32_t Instance(uint32_t parent, std::string_view key) const;
    uint32_t AddPlace(uint32_t parent, uint32_t key, uint32_t keyLen);
@@ -239,15 +249,24 @@ private:
    const char *base_;  // the file's first byte
    const NodeTree &tree_ = TheNodeTree();
    std::vector<std::vector<int>> chains_;  // NodeTree::Chain of each position
-   std::vector<uint32_t> order_;           // the occupied slots in key order
-   std::vector<bool> placed_;              // by place in order_
-   std::vector<Place> places_;             // the root first
+   // Entry j (the entry of the j-th occupied slot): its place in key order.
+   std::vector<uint32_t> rank_;
+   std::vector<bool> placed_;   // by entry
+   std::vector<Place> places_;  // the root first
    // Instances by parent and key: open addressing, (tag << 32) | place.
    std::vector<uint64_t> index_;
    size_t instances_ = 0;
    std::unordered_map<uint32_t, uint32_t> sets_;  // a record's place: the slot of its set answer
    std::vector<bool> done_;                       // instances written as listed
-   RecordEncoder records_;                        // scratch space
+   // The places the last Reach passed, by depth: entries in slot order
+   // mostly share their instance keys with the one before.
+   struct Step {
+      int pos;
+      std::string_view key;  // empty at a fixed name
+      uint32_t place;
+   };
+   std::vector<Step> lastWay_;
+   RecordCodec records_;                          // scratch space
    std::vector<Key> listed_;                      // scratch space
    ByteSet unique_;                               // scratch space
    Json simulator_ = Json::object();
@@ -269,15 +288,19 @@ Entry Dumper::EntryOfSlot(uint32_t slot) const {
    return e;
 }
 
-// The occupied slots in the order of their keys, as a built file has them
-// whatever order its slots have.  Sorted by the keys' first eight bytes
-// (read big-endian, so that they compare as the bytes do), then by the
-// whole keys.  False when the slots do not hold exactly the entries the
+// The rank of each entry in the order of the keys, as a built file has
+// them whatever order its slots have.  Sorted by the keys' first sixteen
+// bytes (read big-endian, so that they compare as the bytes do; enough to
+// tell most keys apart without reading them again), then by the whole keys.  False when the slots do not hold exactly the entries the
 // header counts, all with different keys.
-bool Dumper::SortSlots() {
+bool Dumper::RankEntries() {
    struct Sorted {
-      uint64_t prefix;
-      uint32_t slot;
+      uint64_t prefix[2];
+      uint32_t slot, entry;
+      bool SamePrefix(const Sorted &o) const { return prefix[0] == o.prefix[0] && prefix[1] == o.prefix[1]; }
+      bool PrefixLess(const Sorted &o) const {
+         return prefix[0] != o.prefix[0] ? prefix[0] < o.prefix[0] : prefix[1] < o.prefix[1];
+      }
    };
    std::vector<Sorted> sorted;
    sorted.reserve(reader_.EntryCount());
@@ -286,61 +309,66 @@ bool Dumper::SortSlots() {
       kelplat::CacheHit hit;
       uint32_t tag;
       if (!reader_.SlotAt(i, &key, &hit, &tag)) continue;
-      uint64_t prefix = 0;
-      for (size_t b = 0; b < 8; b++) prefix = prefix << 8 | (b < key.size() ? uint8_t(key[b]) : 0);
-      sorted.push_back({prefix, i});
+      Sorted item{{0, 0}, i, uint32_t(sorted.size())};
+      for (size_t b = 0; b < 16; b++) item.prefix[b / 8] = item.prefix[b / 8] << 8 | (b < key.size() ? uint8_t(key[b]) : 0);
+      sorted.push_back(item);
    }
    if (sorted.size() != reader_.EntryCount()) return false;
    auto keyOf = [this](uint32_t slot) { return EntryOfSlot(slot).key; };
    std::sort(sorted.begin(), sorted.end(), [&](const Sorted &a, const Sorted &b) {
-      return a.prefix != b.prefix ? a.prefix < b.prefix : keyOf(a.slot) < keyOf(b.slot);
+      return !a.SamePrefix(b) ? a.PrefixLess(b) : keyOf(a.slot) < keyOf(b.slot);
    });
-   order_.resize(sorted.size());
+   rank_.resize(sorted.size());
    for (size_t i = 0; i < sorted.size(); i++) {
-      if (i > 0 && sorted[i].prefix == sorted[i - 1].prefix && keyOf(sorted[i].slot) == keyOf(sorted[i - 1].slot))
+      if (i > 0 && sorted[i].SamePrefix(sorted[i - 1]) && keyOf(sorted[i].slot) == keyOf(sorted[i - 1].slot))
          return false;
-      order_[i] = sorted[i].slot;
+      rank_[sorted[i].entry] = uint32_t(i);
    }
    return true;
 }
 
 bool Dumper::Run(TextOut &out, KEL_Status *status) {
-   if (!SortSlots()) {
+   if (!RankEntries()) {
       *status = KEL_STATUS_CACHE_CORRUPT;
       return false;
    }
+   const uint32_t count = uint32_t(rank_.size());
    // Places: about one for each entry and a few more; reserved room costs
    // nothing until used.
-   places_.reserve(order_.size() * 2 + 1);
+   places_.reserve(size_t(count) * 2 + 1);
    places_.emplace_back();  // the root
 
-   // Listings first, so that reads know which instances are listed; sets
-   // last, as they join the read of the same record.
-   auto phaseOf = [](std::string_view key) {
-      switch (key.empty() ? Op(0) : Op(uint8_t(key[0]))) {
-      case Op::List:
-      case Op::Meta: return 0;
-      case Op::Get:
-      case Op::Data: return 1;
-      case Op::Set: return 2;
-      default: return -1;  // an unknown operation stays raw
-      }
+   // Listings and reads first (a listing ranks before every read); then
+   // sets, which join the read of the same record; then the simulator's
+   // settings, in key order.
+   placed_.assign(count, false);
+   struct Meta {
+      uint32_t rank, slot, entry;
+      bool operator<(const Meta &o) const { return rank < o.rank; }
    };
-   placed_.assign(order_.size(), false);
+   std::vector<Meta> metas;
    Lookup l;
-   for (int phase = 0; phase < 3; phase++) {
-      for (size_t i = 0; i < order_.size(); i++) {
-         const Entry e = EntryOfSlot(order_[i]);
-         if (phaseOf(e.key) != phase || !DecodeLookup(e.key, &l)) continue;
-         switch (l.op) {
-         case Op::List: placed_[i] = PlaceListing(e, l, order_[i]); break;
-         case Op::Meta: placed_[i] = PlaceMeta(e, l); break;
-         case Op::Get:
-         case Op::Data: placed_[i] = PlaceRead(e, l, order_[i]); break;
-         case Op::Set: placed_[i] = PlaceSet(e, l, order_[i]); break;
-         default: break;
+   for (int pass = 0; pass < 2; pass++) {
+      for (uint32_t slot = 0, j = 0; slot < reader_.SlotCount(); slot++) {
+         const Entry e = EntryOfSlot(slot);
+         if (e.key.empty()) continue;  // an empty slot
+         const uint32_t entry = j++;
+         if (!DecodeLookup(e.key, &l)) continue;
+         if (pass == 0 && l.op == Op::List) {
+            placed_[entry] = PlaceListing(e, l, slot, rank_[entry]);
+         } else if (pass == 0 && (l.op == Op::Get || l.op == Op::Data)) {
+            placed_[entry] = PlaceRead(e, l, slot, count + rank_[entry]);
+         } else if (pass == 0 && l.op == Op::Meta) {
+            metas.push_back({rank_[entry], slot, entry});
+         } else if (pass == 1 && l.op == Op::Set) {
+            placed_[entry] = PlaceSet(e, l, slot);
          }
       }
+   }
+   std::sort(metas.begin(), metas.end());
+   for (const Meta &m : metas) {
+      const Entry e = EntryOfSlot(m.slot);
+      placed_[m.entry] = DecodeLookup(e.key, &l) && PlaceMeta(e, l);
    }
    OrderChildren();
    done_.assign(places_.size(), false);
@@ -355,10 +383,17 @@ bool Dumper::Run(TextOut &out, KEL_Status *status) {
    if (!simulator_.empty()) doc.Member("simulator", simulator_);
    doc.Member("tree");
    Emit(0, 0, false, out, 1);
+   // The entries left out, in key order.
+   std::vector<std::pair<uint32_t, uint32_t>> left;  // rank, slot
+   for (uint32_t slot = 0, j = 0; slot < reader_.SlotCount(); slot++) {
+      if (EntryOfSlot(slot).key.empty()) continue;
+      const uint32_t entry = j++;
+      if (!placed_[entry]) left.emplace_back(rank_[entry], slot);
+   }
+   std::sort(left.begin(), left.end());
    Json raw = Json::array();
-   for (size_t i = 0; i < order_.size(); i++) {
-      if (placed_[i]) continue;
-      const Entry e = EntryOfSlot(order_[i]);
+   for (const auto &[rank, slot] : left) {
+      const Entry e = EntryOfSlot(slot);
       Json r = Json::object();
       r["key"] = ToHex(e.key);
       if (e.status != KEL_STATUS_OK) r["status"] = FormatStatus(e.status);
@@ -372,7 +407,7 @@ bool Dumper::Run(TextOut &out, KEL_Status *status) {
    return true;
 }
 
-bool Dumper::PlaceListing(const Entry &e, const Lookup &l, uint32_t slot) {
+bool Dumper::PlaceListing(const Entry &e, const Lookup &l, uint32_t slot, uint32_t rank) {
    const NodeInfo *node = kelplat::FindNode(l.node);
    if (node == nullptr || !kelplat::EndsWithLevel(node->path) ||
        l.keys.size() + 1 != kelplat::LevelCount(node->path))
@@ -388,21 +423,21 @@ bool Dumper::PlaceListing(const Entry &e, const Lookup &l, uint32_t slot) {
    }
    int levelObject = tree_.at(tree_.nodePosition[l.node]).parent;
    if (!Representable(l.keys)) return false;
-   places_[Reach(levelObject, l.keys, true)].entry = slot;
+   places_[Reach(levelObject, l.keys, rank)].entry = slot;
    return true;
 }
 
-bool Dumper::PlaceRead(const Entry &e, const Lookup &l, uint32_t slot) {
+bool Dumper::PlaceRead(const Entry &e, const Lookup &l, uint32_t slot, uint32_t rank) {
    const NodeInfo *node = kelplat::FindNode(l.node);
    if (node == nullptr || l.keys.size() != kelplat::LevelCount(node->path)) return false;
    if (l.op == Op::Data) {
       if (!(node->flags & kelplat::KEL_NF_DATA) || !DumpData(e.status, e.data, true)) return false;
    } else {
       if (node->recordSize == 0 || (node->flags & kelplat::KEL_NF_DATA)) return false;
-      if (!DumpRecord(*node, {e.status, e.data, {}}, true, records_)) return false;
+      if (!records_.Dump(*node, {e.status, e.data, {}}, true)) return false;
    }
    if (!Representable(l.keys)) return false;
-   places_[Reach(tree_.nodePosition[l.node], l.keys, true)].entry = slot;
+   places_[Reach(tree_.nodePosition[l.node], l.keys, rank)].entry = slot;
    return true;
 }
 
@@ -413,7 +448,7 @@ bool Dumper::PlaceSet(const Entry &e, const Lookup &l, uint32_t slot) {
        (node->flags & kelplat::KEL_NF_DATA) || !e.data.empty() || l.keys.size() != kelplat::LevelCount(node->path) ||
        !Representable(l.keys))
       return false;
-   uint32_t place = Reach(tree_.nodePosition[l.node], l.keys, false);
+   uint32_t place = Reach(tree_.nodePosition[l.node], l.keys, kNone);
    if (place == kNone || places_[place].entry == kNone) return false;
    sets_[place] = slot;
    return true;
@@ -504,35 +539,46 @@ uint32_t Dumper::AddPlace(uint32_t parent, uint32_t key, uint32_t keyLen) {
    return n;
 }
 
-// Turns every list of children around, into the order they were made.
+// Puts every list of children in the order of their ranks.
 void Dumper::OrderChildren() {
+   std::vector<uint32_t> children;
    for (Place &p : places_) {
-      uint32_t reversed = 0;
-      for (uint32_t c = p.firstChild; c != 0;) {
-         uint32_t next = places_[c].nextSibling;
-         places_[c].nextSibling = reversed;
-         reversed = c;
-         c = next;
+      children.clear();
+      for (uint32_t c = p.firstChild; c != 0; c = places_[c].nextSibling) children.push_back(c);
+      std::sort(children.begin(), children.end(),
+                [this](uint32_t a, uint32_t b) { return places_[a].rank < places_[b].rank; });
+      p.firstChild = 0;
+      for (size_t i = children.size(); i-- > 0;) {
+         places_[children[i]].nextSibling = p.firstChild;
+         p.firstChild = children[i];
       }
-      p.firstChild = reversed;
    }
 }
 
-uint32_t Dumper::Reach(int pos, const std::vector<std::string_view> &keys, bool create) {
+uint32_t Dumper::Reach(int pos, const std::vector<std::string_view> &keys, uint32_t rank) {
+   const bool create = rank != kNone;
    uint32_t place = 0;
-   size_t k = 0;
+   size_t k = 0, depth = 0;
+   bool known = true;  // so far the way of the last call
    for (int c : chains_[size_t(pos)]) {
+      const bool fixed = tree_.at(c).levelKind < 0;
+      std::string_view key = fixed ? std::string_view() : keys[k++];
       uint32_t child;
-      if (tree_.at(c).levelKind < 0) {
-         child = FixedChild(place, c);
-         if (child == kNone && create) child = AddPlace(place, uint32_t(c), 0);
+      known = known && depth < lastWay_.size() && lastWay_[depth].pos == c && lastWay_[depth].key == key;
+      if (known) {
+         child = lastWay_[depth].place;
       } else {
-         std::string_view key = keys[k++];
-         child = Instance(place, key);
-         if (child == kNone && create) child = AddPlace(place, uint32_t(key.data() - base_), uint32_t(key.size()));
+         lastWay_.resize(depth);
+         child = fixed ? FixedChild(place, c) : Instance(place, key);
+         if (child == kNone && create)
+            child = fixed ? AddPlace(place, uint32_t(c), 0)
+                          : AddPlace(place, uint32_t(key.data() - base_), uint32_t(key.size()));
+         if (child == kNone) return kNone;
+         lastWay_.push_back({c, key, child});
       }
-      if (child == kNone) return kNone;
+      if (create) places_[child].rank = std::min(places_[child].rank, rank);
       place = child;
+      depth++;
    }
    return place;
 }
@@ -557,7 +603,7 @@ void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int dept
          const Entry e = EntryOfSlot(p->entry);
          RecordEntry r{e.status, e.data, {}};
          if (auto set = sets_.find(place); set != sets_.end()) r.setStatus = EntryOfSlot(set->second).status;
-         j = DumpRecord(*at.node, r, unlisted, records_).value_or(nullptr);
+         j = records_.Dump(*at.node, r, unlisted).value_or(nullptr);
       }
       AppendJson(out.text, unlisted ? MarkUnlisted(j) : j, depth);
       return;

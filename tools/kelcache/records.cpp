@@ -225,18 +225,18 @@ const RecordDef *FindRecord(KEL_Node number) {
    return nullptr;
 }
 
-void RecordEncoder::Clear(size_t n) {
+void RecordCodec::Clear(size_t n) {
    std::fill(buf_.begin(), buf_.begin() + ptrdiff_t(std::min(dirty_, buf_.size())), '\0');
    dirty_ = 0;
    if (buf_.size() < n) buf_.resize(n, '\0');
 }
 
-void RecordEncoder::PutUint(size_t offset, size_t size, uint64_t v) {
+void RecordCodec::PutUint(size_t offset, size_t size, uint64_t v) {
    Mark(offset + size);
    for (size_t i = 0; i < size; i++) buf_[offset + i] = char(uint8_t(v >> (8 * i)));
 }
 
-void RecordEncoder::PutBytes(const Field &f, std::string_view bytes, const std::string &path) {
+void RecordCodec::PutBytes(const Field &f, std::string_view bytes, const std::string &path) {
    if (bytes.size() > f.width)
       Fail(path, std::to_string(bytes.size()) + " bytes do not fit the field's " + std::to_string(f.width));
    Mark(f.offset + bytes.size());
@@ -245,7 +245,7 @@ void RecordEncoder::PutBytes(const Field &f, std::string_view bytes, const std::
 
 // Lays one field over the buffer.  A text writes its bytes and, when it is
 // shorter than the field, one NUL: any other bytes come from "$raw".
-void RecordEncoder::PutField(const Field &f, const Json &value, const std::string &path) {
+void RecordCodec::PutField(const Field &f, const Json &value, const std::string &path) {
    switch (f.type) {
    case Text: {
       const std::string &text = ReadText(value, path);
@@ -263,11 +263,11 @@ void RecordEncoder::PutField(const Field &f, const Json &value, const std::strin
    }
 }
 
-std::string_view RecordEncoder::Trimmed(size_t n) const {
+std::string_view RecordCodec::Trimmed(size_t n) const {
    return TrimmedZeros(std::string_view(buf_).substr(0, std::min(n, dirty_)));
 }
 
-RecordEntry RecordEncoder::Encode(const kelplat::NodeInfo &node, const Json &value, const std::string &path,
+RecordEntry RecordCodec::Encode(const kelplat::NodeInfo &node, const Json &value, const std::string &path,
                                   bool allowUnlisted) {
    const RecordDef &def = *FindRecord(node.number);
    RecordEntry out;
@@ -360,33 +360,35 @@ RecordEntry RecordEncoder::Encode(const kelplat::NodeInfo &node, const Json &val
    return out;
 }
 
-std::optional<Json> DumpRecord(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject,
-                               RecordEncoder &encoder) {
+bool RecordCodec::EncodesBack(const kelplat::NodeInfo &node, const Json &value, const RecordEntry &entry) {
+   try {
+      return Encode(node, value, "", false).data == entry.data;
+   } catch (const SnapshotError &) {
+      return false;
+   }
+}
+
+std::optional<Json> RecordCodec::Dump(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject) {
    const RecordDef &def = *FindRecord(node.number);
-   std::string buf(entry.data);
-   if (buf.size() < node.recordSize) buf.resize(node.recordSize, '\0');
+   stored_.assign(entry.data);
+   if (stored_.size() < node.recordSize) stored_.resize(node.recordSize, '\0');
    // A failing read usually stores no bytes; then it needs no fields either.
-   Json fields = entry.data.empty() && entry.status != 0 ? Json::object() : DecodeFields(def, buf);
-   auto encodesBack = [&](const Json &j) {
-      try {
-         return encoder.Encode(node, j, "", false).data == entry.data;
-      } catch (const SnapshotError &) {
-         return false;
-      }
-   };
+   Json fields = entry.data.empty() && entry.status != 0 ? Json::object() : DecodeFields(def, stored_);
 
    if (!asObject && (def.flags & kWholeText) && entry.status == 0 && !entry.setStatus &&
-       fields.contains("text") && encodesBack(fields["text"]))
+       fields.contains("text") && EncodesBack(node, fields["text"], entry))
       return fields["text"];
    // The fields alone, then with the stored size, then over the raw bytes.
-   for (int variant = 0; variant < 4; variant++) {
+   // Without statuses the first is the fields as they are.
+   if (entry.status == 0 && !entry.setStatus && EncodesBack(node, fields, entry)) return fields;
+   for (int variant = entry.status == 0 && !entry.setStatus ? 1 : 0; variant < 4; variant++) {
       Json j = Json::object();
       if (entry.status != 0) j["$status"] = FormatStatus(entry.status);
       if (entry.setStatus) j["$setStatus"] = FormatStatus(*entry.setStatus);
       if (variant & 1) j["$size"] = entry.data.size();
       if (variant & 2) j["$raw"] = ToHex(TrimmedZeros(entry.data));
       for (auto it = fields.begin(); it != fields.end(); ++it) j[it.key()] = *it;
-      if (encodesBack(j)) return j;
+      if (EncodesBack(node, j, entry)) return j;
    }
    return std::nullopt;
 }

@@ -47,13 +47,17 @@ struct RecordEntry {
 
 // Lays records out in one buffer kept from record to record, so that a
 // record costs the bytes its fields fill, not its node's full size (a file
-// descriptor's record is 2 KiB, mostly zeros that are trimmed away).
-class RecordEncoder {
+// descriptor's record is 2 KiB, mostly zeros that are trimmed away), and
+// finds the JSON form of stored records with the same buffers.
+class RecordCodec {
 public:
    // The record at path.  "$unlisted" is skipped when allowUnlisted.  Its
-   // data views this encoder's buffer until the next call.
+   // data views this codec's buffer until the next call.
    RecordEntry Encode(const kelplat::NodeInfo &node, const Json &value, const std::string &path,
                       bool allowUnlisted);
+   // The JSON that encodes back to exactly this entry, or nothing when there
+   // is none.  asObject: never a plain string.
+   std::optional<Json> Dump(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject);
 
 private:
    // Room for n bytes, all zero.
@@ -64,15 +68,12 @@ private:
    void PutField(const Field &f, const Json &value, const std::string &path);
    // The first n bytes without the zeros that end them.
    std::string_view Trimmed(size_t n) const;
+   bool EncodesBack(const kelplat::NodeInfo &node, const Json &value, const RecordEntry &entry);
 
    std::string buf_;
    size_t dirty_ = 0;  // every byte from here on is zero
+   std::string stored_;  // a stored record, zero-filled to its node's size
 };
-
-// The JSON that encodes back to exactly this entry, or nothing when there is
-// none.  asObject: never a plain string.  encoder is scratch space.
-std::optional<Json> DumpRecord(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject,
-                               RecordEncoder &encoder);
 
 }  // namespace kelcache
 
