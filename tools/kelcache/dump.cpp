@@ -33,6 +33,7 @@ using kelplat::NodeInfo;
 using kelplat::Op;
 
 constexpr uint32_t kNone = 0xffffffff;
+constexpr uint32_t kFixed = 0xffffffff;  // the kind of a place at a fixed name
 
 struct Entry {
    std::string_view key;
@@ -215,9 +216,11 @@ struct Place {
    // The slot of the read or data content here, or of the listing of the
    // instances below.
    uint32_t entry = kNone;
-   // A fixed name: its position; an instance: where its key as stored lies
-   // in the file, and its length (never 0).
-   uint32_t key = 0, keyLen = 0;
+   // A fixed name: kFixed, and its position as value.  An instance: its
+   // key's kind, and its value or (a text) where the text lies in the file
+   // (offset << 32 | length), so that most keys compare without the file.
+   uint32_t kind = kFixed;
+   uint64_t value = 0;
 };
 
 class Dumper {
@@ -240,7 +243,13 @@ private:
    uint32_t Reach(int pos, const std::vector<std::string_view> &keys, uint32_t rank);
    uint32_t FixedChild(uint32_t place, int pos) const;
    uint32_t Instance(uint32_t parent, std::string_view key) const;
-   uint32_t AddPlace(uint32_t parent, uint32_t key, uint32_t keyLen);
+   // A place at a fixed position, or for an instance key as stored (a view
+   // of the file's bytes).
+   uint32_t AddPlace(uint32_t parent, int pos);
+   uint32_t AddPlace(uint32_t parent, std::string_view key);
+   // Whether place p is the instance with this key as stored.
+   bool IsInstance(const Place &p, std::string_view key) const;
+   Key KeyOf(const Place &p) const;
    void GrowIndex();
    void OrderChildren();
    void Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int depth);
@@ -482,7 +491,7 @@ bool Dumper::Representable(const std::vector<std::string_view> &keys) {
 
 uint32_t Dumper::FixedChild(uint32_t place, int pos) const {
    for (uint32_t c = places_[place].firstChild; c != 0; c = places_[c].nextSibling)
-      if (places_[c].keyLen == 0 && places_[c].key == uint32_t(pos)) return c;
+      if (places_[c].kind == kFixed && places_[c].value == uint64_t(pos)) return c;
    return kNone;
 }
 
@@ -499,7 +508,7 @@ uint32_t Dumper::Instance(uint32_t parent, std::string_view key) const {
    for (size_t i = IndexHome(tag, mask); index_[i] != 0; i = (i + 1) & mask) {
       if (uint32_t(index_[i] >> 32) != tag) continue;
       const Place &p = places_[uint32_t(index_[i])];
-      if (p.parent == parent && std::string_view(base_ + p.key, p.keyLen) == key) return uint32_t(index_[i]);
+      if (p.parent == parent && IsInstance(p, key)) return uint32_t(index_[i]);
    }
    return kNone;
 }
@@ -516,26 +525,51 @@ void Dumper::GrowIndex() {
    index_ = std::move(grown);
 }
 
-// A new place, first in its parent's list (OrderChildren turns the lists
-// around once all are made); an instance also goes into the index.
-uint32_t Dumper::AddPlace(uint32_t parent, uint32_t key, uint32_t keyLen) {
+bool Dumper::IsInstance(const Place &p, std::string_view key) const {
+   const auto *k = reinterpret_cast<const uint8_t *>(key.data());
+   if (p.kind != k[0]) return false;
+   if (p.kind != KEL_PARAM_STRING) return p.value == kelplat::LoadU64(k + 1);
+   return std::string_view(base_ + (p.value >> 32), uint32_t(p.value)) == key.substr(5);
+}
+
+Key Dumper::KeyOf(const Place &p) const {
+   if (p.kind != KEL_PARAM_STRING) return Key{p.kind, p.value, {}};
+   return Key{p.kind, 0, std::string(base_ + (p.value >> 32), uint32_t(p.value))};
+}
+
+// A new place, first in its parent's list (OrderChildren puts the lists in
+// order once all are made).
+uint32_t Dumper::AddPlace(uint32_t parent, int pos) {
    uint32_t n = uint32_t(places_.size());
    Place p;
    p.parent = parent;
-   p.key = key;
-   p.keyLen = keyLen;
+   p.value = uint64_t(pos);
    p.nextSibling = places_[parent].firstChild;
    places_.push_back(p);
    places_[parent].firstChild = n;
-   if (keyLen > 0) {
-      if ((instances_ + 1) * 4 > index_.size() * 3) GrowIndex();
-      const uint32_t tag = InstanceTag(parent, std::string_view(base_ + key, keyLen));
-      const size_t mask = index_.size() - 1;
-      size_t i = IndexHome(tag, mask);
-      while (index_[i] != 0) i = (i + 1) & mask;
-      index_[i] = uint64_t(tag) << 32 | n;
-      instances_++;
-   }
+   return n;
+}
+
+// An instance also goes into the index.
+uint32_t Dumper::AddPlace(uint32_t parent, std::string_view key) {
+   uint32_t n = uint32_t(places_.size());
+   Place p;
+   p.parent = parent;
+   p.kind = uint8_t(key[0]);
+   if (p.kind == KEL_PARAM_STRING)
+      p.value = uint64_t(key.data() + 5 - base_) << 32 | (key.size() - 5);
+   else
+      p.value = kelplat::LoadU64(reinterpret_cast<const uint8_t *>(key.data()) + 1);
+   p.nextSibling = places_[parent].firstChild;
+   places_.push_back(p);
+   places_[parent].firstChild = n;
+   if ((instances_ + 1) * 4 > index_.size() * 3) GrowIndex();
+   const uint32_t tag = InstanceTag(parent, key);
+   const size_t mask = index_.size() - 1;
+   size_t i = IndexHome(tag, mask);
+   while (index_[i] != 0) i = (i + 1) & mask;
+   index_[i] = uint64_t(tag) << 32 | n;
+   instances_++;
    return n;
 }
 
@@ -570,9 +604,7 @@ uint32_t Dumper::Reach(int pos, const std::vector<std::string_view> &keys, uint3
       } else {
          lastWay_.resize(depth);
          child = fixed ? FixedChild(place, c) : Instance(place, key);
-         if (child == kNone && create)
-            child = fixed ? AddPlace(place, uint32_t(c), 0)
-                          : AddPlace(place, uint32_t(key.data() - base_), uint32_t(key.size()));
+         if (child == kNone && create) child = fixed ? AddPlace(place, c) : AddPlace(place, key);
          if (child == kNone) return kNone;
          lastWay_.push_back({c, key, child});
       }
@@ -639,12 +671,9 @@ void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int dept
       Emit(level, child, false, out, depth + 1);
       if (child != kNone) done_[child] = true;
    }
-   Key k;
    for (uint32_t c = p->firstChild; c != 0; c = places_[c].nextSibling) {
       if (done_[c]) continue;
-      size_t at = 0;
-      kelplat::DecodeKey(std::string_view(base_ + places_[c].key, places_[c].keyLen), &at, &k);
-      object.Member(*KeyName(k, kind));
+      object.Member(*KeyName(KeyOf(places_[c]), kind));
       Emit(level, c, listing, out, depth + 1);
    }
    object.End();

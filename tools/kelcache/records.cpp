@@ -180,29 +180,32 @@ std::string_view TrimmedZeros(std::string_view bytes) {
 // bytes JSON cannot carry (texts that are not UTF-8) are left out.
 Json DecodeFields(const RecordDef &def, std::string_view buf) {
    Json out = Json::object();
+   // Each field once: appended without the ordered object's search.
+   Json::object_t &members = out.get_ref<Json::object_t &>();
+   members.reserve(def.fields.size());
    for (const Field &f : def.fields) {
-      std::string name(f.name);
       std::string_view bytes = buf.substr(f.offset, FieldSize(f));
+      auto put = [&](Json value) { members.emplace_back(std::string(f.name), std::move(value)); };
       switch (f.type) {
-      case I32: out[name] = int32_t(uint32_t(GetUint(buf, f.offset, 4))); break;
+      case I32: put(int32_t(uint32_t(GetUint(buf, f.offset, 4)))); break;
       case Text: {
          std::string_view text = bytes.substr(0, bytes.find('\0'));
-         if (ValidUtf8(text)) out[name] = std::string(text);
+         if (ValidUtf8(text)) put(std::string(text));
          break;
       }
       case Hex: {
          if (def.flags & kAcpiBuffer) break;  // the table bytes: below, as long as "length" says
          std::string_view used = TrimmedZeros(bytes);
-         if (!used.empty()) out[name] = ToHex(used);
+         if (!used.empty()) put(ToHex(used));
          break;
       }
       case Mac: {
          std::string hex = ToHex(bytes), text;
          for (size_t i = 0; i < hex.size(); i += 2) text += (i ? ":" : "") + hex.substr(i, 2);
-         out[name] = text;
+         put(text);
          break;
       }
-      default: out[name] = GetUint(buf, f.offset, FieldSize(f));
+      default: put(GetUint(buf, f.offset, FieldSize(f)));
       }
    }
    if (def.flags & kAcpiBuffer) {
@@ -281,12 +284,8 @@ RecordEntry RecordCodec::Encode(const kelplat::NodeInfo &node, const Json &value
       Fail(path, def.flags & kWholeText ? "expected a text or an object of record fields"
                                         : "expected an object of record fields");
 
-   struct Given {
-      const Field *field;
-      const Json *value;
-      std::string path;
-   };
-   std::vector<Given> given;
+   std::vector<Given> &given = given_;
+   given.clear();
    std::optional<uint64_t> size;
    std::string raw, rawPath;
    const Json *tableText = nullptr, *unlinked = nullptr;

@@ -8,6 +8,7 @@
 #include <span>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "nodetable.h"
 #include "values.h"
@@ -70,6 +71,13 @@ private:
    std::string_view Trimmed(size_t n) const;
    bool EncodesBack(const kelplat::NodeInfo &node, const Json &value, const RecordEntry &entry);
 
+   // A field given in the record's object.
+   struct Given {
+      const Field *field;
+      const Json *value;
+      std::string path;
+   };
+   std::vector<Given> given_;
    std::string buf_;
    size_t dirty_ = 0;  // every byte from here on is zero
    std::string stored_;  // a stored record, zero-filled to its node's size
