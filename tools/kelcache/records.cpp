@@ -369,10 +369,16 @@ bool RecordCodec::EncodesBack(const kelplat::NodeInfo &node, const Json &value, 
 
 std::optional<Json> RecordCodec::Dump(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject) {
    const RecordDef &def = *FindRecord(node.number);
-   stored_.assign(entry.data);
-   if (stored_.size() < node.recordSize) stored_.resize(node.recordSize, '\0');
+   // The stored bytes, zero-filled to the node's size: the buffer is kept
+   // zero past the bytes the last record put there.
+   const size_t size = std::max<size_t>(entry.data.size(), node.recordSize);
+   std::fill(stored_.begin(), stored_.begin() + ptrdiff_t(std::min(storedUsed_, stored_.size())), '\0');
+   if (stored_.size() < size) stored_.resize(size, '\0');
+   std::copy(entry.data.begin(), entry.data.end(), stored_.begin());
+   storedUsed_ = entry.data.size();
+   std::string_view stored = std::string_view(stored_).substr(0, size);
    // A failing read usually stores no bytes; then it needs no fields either.
-   Json fields = entry.data.empty() && entry.status != 0 ? Json::object() : DecodeFields(def, stored_);
+   Json fields = entry.data.empty() && entry.status != 0 ? Json::object() : DecodeFields(def, stored);
 
    if (!asObject && (def.flags & kWholeText) && entry.status == 0 && !entry.setStatus &&
        fields.contains("text") && EncodesBack(node, fields["text"], entry))

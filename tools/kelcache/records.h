@@ -80,7 +80,8 @@ private:
    std::vector<Given> given_;
    std::string buf_;
    size_t dirty_ = 0;  // every byte from here on is zero
-   std::string stored_;  // a stored record, zero-filled to its node's size
+   std::string stored_;     // a stored record, zero-filled to its node's size
+   size_t storedUsed_ = 0;  // every byte of stored_ from here on is zero
 };
 
 }  // namespace kelcache
