@@ -260,21 +260,22 @@ private:
    std::vector<std::vector<int>> chains_;  // NodeTree::Chain of each position
    // Entry j (the entry of the j-th occupied slot): its place in key order.
    std::vector<uint32_t> rank_;
-   std::vector<bool> placed_;   // by entry
    std::vector<Place> places_;  // the root first
    // Instances by parent and key: open addressing, (tag << 32) | place.
    std::vector<uint64_t> index_;
    size_t instances_ = 0;
    std::unordered_map<uint32_t, uint32_t> sets_;  // a record's place: the slot of its set answer
    std::vector<bool> done_;                       // instances written as listed
-   // The places the last Reach passed, by depth: entries in slot order
-   // mostly share their instance keys with the one before.
+   // The places the last Reach below each top-level name passed, by depth:
+   // entries in slot order mostly share their instance keys with one of the
+   // entries just before (a world's name and record, then its processor's
+   // statistics, then its cartel's).
    struct Step {
       int pos;
       std::string_view key;  // empty at a fixed name
       uint32_t place;
    };
-   std::vector<Step> lastWay_;
+   std::vector<std::vector<Step>> lastWays_;  // by position
    RecordCodec records_;                          // scratch space
    std::vector<Key> listed_;                      // scratch space
    ByteSet unique_;                               // scratch space
@@ -282,7 +283,8 @@ private:
 };
 
 Dumper::Dumper(const kelplat::CacheReader &reader)
-   : reader_(reader), base_(reader.Bytes().data()), chains_(tree_.positions.size()) {
+   : reader_(reader), base_(reader.Bytes().data()), chains_(tree_.positions.size()),
+     lastWays_(tree_.positions.size()) {
    for (size_t i = 0; i < chains_.size(); i++) chains_[i] = tree_.Chain(int(i));
 }
 
@@ -347,37 +349,41 @@ bool Dumper::Run(TextOut &out, KEL_Status *status) {
    places_.reserve(size_t(count) * 2 + 1);
    places_.emplace_back();  // the root
 
-   // Listings and reads first (a listing ranks before every read); then
-   // sets, which join the read of the same record; then the simulator's
-   // settings, in key order.
-   placed_.assign(count, false);
-   struct Meta {
-      uint32_t rank, slot, entry;
-      bool operator<(const Meta &o) const { return rank < o.rank; }
+   // Listings and reads in one pass over the slots (a listing ranks before
+   // every read); then sets, which join the read of the same record; then
+   // the simulator's settings, in key order.  What is not placed is left
+   // for "rawEntries", in key order.
+   struct Later {
+      uint32_t rank, slot;
+      bool operator<(const Later &o) const { return rank < o.rank; }
    };
-   std::vector<Meta> metas;
+   std::vector<Later> sets, metas, left;
    Lookup l;
-   for (int pass = 0; pass < 2; pass++) {
-      for (uint32_t slot = 0, j = 0; slot < reader_.SlotCount(); slot++) {
-         const Entry e = EntryOfSlot(slot);
-         if (e.key.empty()) continue;  // an empty slot
-         const uint32_t entry = j++;
-         if (!DecodeLookup(e.key, &l)) continue;
-         if (pass == 0 && l.op == Op::List) {
-            placed_[entry] = PlaceListing(e, l, slot, rank_[entry]);
-         } else if (pass == 0 && (l.op == Op::Get || l.op == Op::Data)) {
-            placed_[entry] = PlaceRead(e, l, slot, count + rank_[entry]);
-         } else if (pass == 0 && l.op == Op::Meta) {
-            metas.push_back({rank_[entry], slot, entry});
-         } else if (pass == 1 && l.op == Op::Set) {
-            placed_[entry] = PlaceSet(e, l, slot);
+   for (uint32_t slot = 0, j = 0; slot < reader_.SlotCount(); slot++) {
+      const Entry e = EntryOfSlot(slot);
+      if (e.key.empty()) continue;  // an empty slot
+      const uint32_t rank = rank_[j++];
+      bool placed = false;
+      if (DecodeLookup(e.key, &l)) {
+         if (l.op == Op::List) {
+            placed = PlaceListing(e, l, slot, rank);
+         } else if (l.op == Op::Get || l.op == Op::Data) {
+            placed = PlaceRead(e, l, slot, count + rank);
+         } else if (l.op == Op::Set || l.op == Op::Meta) {
+            (l.op == Op::Set ? sets : metas).push_back({rank, slot});
+            continue;
          }
       }
+      if (!placed) left.push_back({rank, slot});
    }
+   rank_ = {};
    std::sort(metas.begin(), metas.end());
-   for (const Meta &m : metas) {
-      const Entry e = EntryOfSlot(m.slot);
-      placed_[m.entry] = DecodeLookup(e.key, &l) && PlaceMeta(e, l);
+   for (const std::vector<Later> *later : {&sets, &metas}) {
+      for (const Later &m : *later) {
+         const Entry e = EntryOfSlot(m.slot);
+         DecodeLookup(e.key, &l);
+         if (!(l.op == Op::Set ? PlaceSet(e, l, m.slot) : PlaceMeta(e, l))) left.push_back(m);
+      }
    }
    OrderChildren();
    done_.assign(places_.size(), false);
@@ -393,16 +399,10 @@ bool Dumper::Run(TextOut &out, KEL_Status *status) {
    doc.Member("tree");
    Emit(0, 0, false, out, 1);
    // The entries left out, in key order.
-   std::vector<std::pair<uint32_t, uint32_t>> left;  // rank, slot
-   for (uint32_t slot = 0, j = 0; slot < reader_.SlotCount(); slot++) {
-      if (EntryOfSlot(slot).key.empty()) continue;
-      const uint32_t entry = j++;
-      if (!placed_[entry]) left.emplace_back(rank_[entry], slot);
-   }
    std::sort(left.begin(), left.end());
    Json raw = Json::array();
-   for (const auto &[rank, slot] : left) {
-      const Entry e = EntryOfSlot(slot);
+   for (const Later &unplaced : left) {
+      const Entry e = EntryOfSlot(unplaced.slot);
       Json r = Json::object();
       r["key"] = ToHex(e.key);
       if (e.status != KEL_STATUS_OK) r["status"] = FormatStatus(e.status);
@@ -591,22 +591,25 @@ void Dumper::OrderChildren() {
 
 uint32_t Dumper::Reach(int pos, const std::vector<std::string_view> &keys, uint32_t rank) {
    const bool create = rank != kNone;
+   const std::vector<int> &chain = chains_[size_t(pos)];
+   if (chain.empty()) return 0;
+   std::vector<Step> &lastWay = lastWays_[size_t(chain[0])];
    uint32_t place = 0;
    size_t k = 0, depth = 0;
    bool known = true;  // so far the way of the last call
-   for (int c : chains_[size_t(pos)]) {
+   for (int c : chain) {
       const bool fixed = tree_.at(c).levelKind < 0;
       std::string_view key = fixed ? std::string_view() : keys[k++];
       uint32_t child;
-      known = known && depth < lastWay_.size() && lastWay_[depth].pos == c && lastWay_[depth].key == key;
+      known = known && depth < lastWay.size() && lastWay[depth].pos == c && lastWay[depth].key == key;
       if (known) {
-         child = lastWay_[depth].place;
+         child = lastWay[depth].place;
       } else {
-         lastWay_.resize(depth);
+         lastWay.resize(depth);
          child = fixed ? FixedChild(place, c) : Instance(place, key);
          if (child == kNone && create) child = fixed ? AddPlace(place, c) : AddPlace(place, key);
          if (child == kNone) return kNone;
-         lastWay_.push_back({c, key, child});
+         lastWay.push_back({c, key, child});
       }
       if (create) places_[child].rank = std::min(places_[child].rank, rank);
       place = child;
