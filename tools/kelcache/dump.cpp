@@ -205,8 +205,8 @@ private:
 };
 
 // What was found at one position for one set of instance keys: the root, a
-// fixed name or an instance.  Children are a list, in the order of their
-// ranks once placing is done; instances are also found through a hash.
+// fixed name or an instance.  Children are a list, the last made first;
+// instances are also found through a hash.
 struct Place {
    uint32_t firstChild = 0, nextSibling = 0;  // 0: none (the root is nobody's child)
    uint32_t parent = 0;
@@ -251,7 +251,6 @@ private:
    bool IsInstance(const Place &p, std::string_view key) const;
    Key KeyOf(const Place &p) const;
    void GrowIndex();
-   void OrderChildren();
    void Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int depth);
 
    const kelplat::CacheReader &reader_;
@@ -385,7 +384,6 @@ bool Dumper::Run(TextOut &out, KEL_Status *status) {
          if (!(l.op == Op::Set ? PlaceSet(e, l, m.slot) : PlaceMeta(e, l))) left.push_back(m);
       }
    }
-   OrderChildren();
    done_.assign(places_.size(), false);
 
    ObjectWriter doc(out, 0);
@@ -537,8 +535,7 @@ Key Dumper::KeyOf(const Place &p) const {
    return Key{p.kind, 0, std::string(base_ + (p.value >> 32), uint32_t(p.value))};
 }
 
-// A new place, first in its parent's list (OrderChildren puts the lists in
-// order once all are made).
+// A new place, first in its parent's list.
 uint32_t Dumper::AddPlace(uint32_t parent, int pos) {
    uint32_t n = uint32_t(places_.size());
    Place p;
@@ -571,22 +568,6 @@ uint32_t Dumper::AddPlace(uint32_t parent, std::string_view key) {
    index_[i] = uint64_t(tag) << 32 | n;
    instances_++;
    return n;
-}
-
-// Puts every list of children in the order of their ranks.
-void Dumper::OrderChildren() {
-   std::vector<uint32_t> children;
-   for (Place &p : places_) {
-      children.clear();
-      for (uint32_t c = p.firstChild; c != 0; c = places_[c].nextSibling) children.push_back(c);
-      std::sort(children.begin(), children.end(),
-                [this](uint32_t a, uint32_t b) { return places_[a].rank < places_[b].rank; });
-      p.firstChild = 0;
-      for (size_t i = children.size(); i-- > 0;) {
-         places_[children[i]].nextSibling = p.firstChild;
-         p.firstChild = children[i];
-      }
-   }
 }
 
 uint32_t Dumper::Reach(int pos, const std::vector<std::string_view> &keys, uint32_t rank) {
@@ -665,17 +646,26 @@ void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int dept
    } else if (tree_.at(level).node != nullptr) {
       object.Member("$noListing", true);
    }
+   // The listed instances' places, found all at once before any is
+   // written: lookups that do not wait for one another.
+   std::vector<uint32_t> children(listed.size());
    std::string encoded;
-   for (const Key &k : listed) {
+   for (size_t i = 0; i < listed.size(); i++) {
       encoded.clear();
-      kelplat::AppendKey(encoded, k);
-      uint32_t child = Instance(place, encoded);
-      object.Member(*KeyName(k, kind));
-      Emit(level, child, false, out, depth + 1);
-      if (child != kNone) done_[child] = true;
+      kelplat::AppendKey(encoded, listed[i]);
+      children[i] = Instance(place, encoded);
    }
-   for (uint32_t c = p->firstChild; c != 0; c = places_[c].nextSibling) {
-      if (done_[c]) continue;
+   for (size_t i = 0; i < listed.size(); i++) {
+      object.Member(*KeyName(listed[i], kind));
+      Emit(level, children[i], false, out, depth + 1);
+      if (children[i] != kNone) done_[children[i]] = true;
+   }
+   // The others in the order of their ranks.
+   std::vector<uint32_t> others;
+   for (uint32_t c = p->firstChild; c != 0; c = places_[c].nextSibling)
+      if (!done_[c]) others.push_back(c);
+   std::sort(others.begin(), others.end(), [this](uint32_t a, uint32_t b) { return places_[a].rank < places_[b].rank; });
+   for (uint32_t c : others) {
       object.Member(*KeyName(KeyOf(places_[c]), kind));
       Emit(level, c, listing, out, depth + 1);
    }
