@@ -660,12 +660,13 @@ void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int dept
       Emit(level, children[i], false, out, depth + 1);
       if (children[i] != kNone) done_[children[i]] = true;
    }
-   // The others in the order of their ranks.
-   std::vector<uint32_t> others;
+   // The others in the order of their ranks (read once each, so that the
+   // sort touches no place).
+   std::vector<std::pair<uint32_t, uint32_t>> others;  // rank, place
    for (uint32_t c = p->firstChild; c != 0; c = places_[c].nextSibling)
-      if (!done_[c]) others.push_back(c);
-   std::sort(others.begin(), others.end(), [this](uint32_t a, uint32_t b) { return places_[a].rank < places_[b].rank; });
-   for (uint32_t c : others) {
+      if (!done_[c]) others.emplace_back(places_[c].rank, c);
+   std::sort(others.begin(), others.end());
+   for (const auto &[rank, c] : others) {
       object.Member(*KeyName(KeyOf(places_[c]), kind));
       Emit(level, c, listing, out, depth + 1);
    }
