@@ -78,6 +78,9 @@ bool Nameable(std::string_view encoded) {
 }
 bool Nameable(const Key &key) { return key.kind != KEL_PARAM_STRING || ValidUtf8(key.text); }
 
+// The length of a key as stored: its kind, then a value or a length and a text.
+size_t EncodedSize(const Key &key) { return key.kind == KEL_PARAM_STRING ? 5 + key.text.size() : 9; }
+
 // The simulator's rules text as JSON, when the JSON builds it back exactly.
 std::optional<Json> DumpRules(std::string_view text) {
    Json rules = Json::array();
@@ -208,13 +211,17 @@ private:
 // fixed name or an instance.  Children are a list, the last made first;
 // instances are also found through a hash.
 struct Place {
-   uint32_t firstChild = 0, nextSibling = 0;  // 0: none (the root is nobody's child)
+   union {
+      uint32_t firstChild = 0;  // 0: none (the root is nobody's child)
+      uint32_t dataLen;         // a record or content (which has no children): its data's length
+   };
+   uint32_t nextSibling = 0;
    uint32_t parent = 0;
    // The first entry to reach this place: listings before reads, each in
    // key order.
    uint32_t rank = kNone;
-   // The slot of the read or data content here, or of the listing of the
-   // instances below.
+   // A record or content: where its entry lies in the file, so that writing
+   // it reads no slot; an object of instances: the slot of its listing.
    uint32_t entry = kNone;
    // A fixed name: kFixed, and its position as value.  An instance: its
    // key's kind, and its value or (a text) where the text lies in the file
@@ -234,7 +241,9 @@ private:
    Entry EntryOfSlot(uint32_t slot) const;
    bool RankEntries();
    bool PlaceListing(const Entry &e, const Lookup &l, uint32_t slot, uint32_t rank);
-   bool PlaceRead(const Entry &e, const Lookup &l, uint32_t slot, uint32_t rank);
+   bool PlaceRead(const Entry &e, const Lookup &l, uint32_t rank);
+   // The entry of a record or content, whose key is keyLen bytes long.
+   Entry StoredAt(const Place &p, size_t keyLen) const;
    bool PlaceSet(const Entry &e, const Lookup &l, uint32_t slot);
    bool PlaceMeta(const Entry &e, const Lookup &l);
    static bool Representable(const std::vector<std::string_view> &keys);
@@ -251,7 +260,9 @@ private:
    bool IsInstance(const Place &p, std::string_view key) const;
    Key KeyOf(const Place &p) const;
    void GrowIndex();
-   void Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int depth);
+   // keyLen: the length of the keys of entries at pos (3 and the instance
+   // keys above).
+   void Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int depth, size_t keyLen);
 
    const kelplat::CacheReader &reader_;
    const char *base_;  // the file's first byte
@@ -367,7 +378,7 @@ bool Dumper::Run(TextOut &out, KEL_Status *status) {
          if (l.op == Op::List) {
             placed = PlaceListing(e, l, slot, rank);
          } else if (l.op == Op::Get || l.op == Op::Data) {
-            placed = PlaceRead(e, l, slot, count + rank);
+            placed = PlaceRead(e, l, count + rank);
          } else if (l.op == Op::Set || l.op == Op::Meta) {
             (l.op == Op::Set ? sets : metas).push_back({rank, slot});
             continue;
@@ -395,7 +406,7 @@ bool Dumper::Run(TextOut &out, KEL_Status *status) {
    doc.Member("signature", ToHex({reinterpret_cast<const char *>(reader_.Signature().data()), 16}));
    if (!simulator_.empty()) doc.Member("simulator", simulator_);
    doc.Member("tree");
-   Emit(0, 0, false, out, 1);
+   Emit(0, 0, false, out, 1, 3);
    // The entries left out, in key order.
    std::sort(left.begin(), left.end());
    Json raw = Json::array();
@@ -434,7 +445,7 @@ bool Dumper::PlaceListing(const Entry &e, const Lookup &l, uint32_t slot, uint32
    return true;
 }
 
-bool Dumper::PlaceRead(const Entry &e, const Lookup &l, uint32_t slot, uint32_t rank) {
+bool Dumper::PlaceRead(const Entry &e, const Lookup &l, uint32_t rank) {
    const NodeInfo *node = kelplat::FindNode(l.node);
    if (node == nullptr || l.keys.size() != kelplat::LevelCount(node->path)) return false;
    if (l.op == Op::Data) {
@@ -444,7 +455,9 @@ bool Dumper::PlaceRead(const Entry &e, const Lookup &l, uint32_t slot, uint32_t 
       if (!records_.Dump(*node, {e.status, e.data, {}}, true)) return false;
    }
    if (!Representable(l.keys)) return false;
-   places_[Reach(tree_.nodePosition[l.node], l.keys, rank)].entry = slot;
+   Place &place = places_[Reach(tree_.nodePosition[l.node], l.keys, rank)];
+   place.entry = uint32_t(e.key.data() - base_ - kelplat::kEntryHeadSize);
+   place.dataLen = uint32_t(e.data.size());
    return true;
 }
 
@@ -601,13 +614,20 @@ uint32_t Dumper::Reach(int pos, const std::vector<std::string_view> &keys, uint3
 
 // Writes the JSON at a position, depth levels deep; place is kNone for a
 // listed instance with nothing stored below it.
-void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int depth) {
+Entry Dumper::StoredAt(const Place &p, size_t keyLen) const {
+   Entry e;
+   e.status = kelplat::LoadU32(reinterpret_cast<const uint8_t *>(base_) + p.entry);
+   e.data = std::string_view(base_ + p.entry + kelplat::kEntryHeadSize + keyLen, p.dataLen);
+   return e;
+}
+
+void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int depth, size_t keyLen) {
    const Position &at = tree_.at(pos);
    const Place *p = place == kNone ? nullptr : &places_[place];
    if (at.node != nullptr && (at.node->flags & kelplat::KEL_NF_DATA)) {
       Json j = nullptr;
       if (p != nullptr && p->entry != kNone) {
-         const Entry e = EntryOfSlot(p->entry);
+         const Entry e = StoredAt(*p, keyLen);
          j = DumpData(e.status, e.data, unlisted).value_or(nullptr);
       }
       AppendJson(out.text, unlisted ? MarkUnlisted(j) : j, depth);
@@ -616,7 +636,7 @@ void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int dept
    if (at.node != nullptr && at.node->recordSize > 0) {
       Json j = nullptr;
       if (p != nullptr && p->entry != kNone) {
-         const Entry e = EntryOfSlot(p->entry);
+         const Entry e = StoredAt(*p, keyLen);
          RecordEntry r{e.status, e.data, {}};
          if (auto set = sets_.find(place); set != sets_.end()) r.setStatus = EntryOfSlot(set->second).status;
          j = records_.Dump(*at.node, r, unlisted).value_or(nullptr);
@@ -632,7 +652,7 @@ void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int dept
       for (int c : at.children)
          if (uint32_t child = FixedChild(place, c); child != kNone) {
             object.Member(tree_.at(c).name);
-            Emit(c, child, false, out, depth + 1);
+            Emit(c, child, false, out, depth + 1, keyLen);
          }
       return object.End();
    }
@@ -657,7 +677,7 @@ void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int dept
    }
    for (size_t i = 0; i < listed.size(); i++) {
       object.Member(*KeyName(listed[i], kind));
-      Emit(level, children[i], false, out, depth + 1);
+      Emit(level, children[i], false, out, depth + 1, keyLen + EncodedSize(listed[i]));
       if (children[i] != kNone) done_[children[i]] = true;
    }
    // The others in the order of their ranks (read once each, so that the
@@ -667,8 +687,9 @@ void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int dept
       if (!done_[c]) others.emplace_back(places_[c].rank, c);
    std::sort(others.begin(), others.end());
    for (const auto &[rank, c] : others) {
-      object.Member(*KeyName(KeyOf(places_[c]), kind));
-      Emit(level, c, listing, out, depth + 1);
+      const Key k = KeyOf(places_[c]);
+      object.Member(*KeyName(k, kind));
+      Emit(level, c, listing, out, depth + 1, keyLen + EncodedSize(k));
    }
    object.End();
 }
