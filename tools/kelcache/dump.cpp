@@ -34,6 +34,8 @@ using kelplat::Op;
 
 constexpr uint32_t kNone = 0xffffffff;
 constexpr uint32_t kFixed = 0xffffffff;  // the kind of a place at a fixed name
+// Objects of at most this many instances are searched in order when written.
+constexpr size_t kFewInstances = 16;
 
 struct Entry {
    std::string_view key;
@@ -666,14 +668,22 @@ void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int dept
    } else if (tree_.at(level).node != nullptr) {
       object.Member("$noListing", true);
    }
-   // The listed instances' places, found all at once before any is
-   // written: lookups that do not wait for one another.
+   // The instances as made, and the listed ones' places, found all at once
+   // before any is written: among the few instances of a small object, else
+   // through the index, in lookups that do not wait for one another.
+   std::vector<uint32_t> made;
+   for (uint32_t c = p->firstChild; c != 0; c = places_[c].nextSibling) made.push_back(c);
    std::vector<uint32_t> children(listed.size());
    std::string encoded;
    for (size_t i = 0; i < listed.size(); i++) {
       encoded.clear();
       kelplat::AppendKey(encoded, listed[i]);
-      children[i] = Instance(place, encoded);
+      if (made.size() > kFewInstances) {
+         children[i] = Instance(place, encoded);
+         continue;
+      }
+      auto it = std::find_if(made.begin(), made.end(), [&](uint32_t c) { return IsInstance(places_[c], encoded); });
+      children[i] = it == made.end() ? kNone : *it;
    }
    for (size_t i = 0; i < listed.size(); i++) {
       object.Member(*KeyName(listed[i], kind));
@@ -683,7 +693,7 @@ void Dumper::Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int dept
    // The others in the order of their ranks (read once each, so that the
    // sort touches no place).
    std::vector<std::pair<uint32_t, uint32_t>> others;  // rank, place
-   for (uint32_t c = p->firstChild; c != 0; c = places_[c].nextSibling)
+   for (uint32_t c : made)
       if (!done_[c]) others.emplace_back(places_[c].rank, c);
    std::sort(others.begin(), others.end());
    for (const auto &[rank, c] : others) {
