@@ -250,18 +250,21 @@ bool CacheWriter::Add(std::string_view lookup, uint32_t status, std::string_view
    return true;
 }
 
-// Sends the file's bytes after the header to sink.Put(bytes, n) in file
-// order, then gives the header to sink.Header(header), its checksum being
-// sink.Checksum() of what was put.  Entries take slots in
-// the order of their keys, so that the table is the same for the same
-// entries whatever order they were added in.
+// Makes the file through sink: sink.Append(bytes, n) gives the entries'
+// bytes in file order, from the end of the slot table on; sink.Place(offset,
+// bytes, n) then gives the slot table and last the header, whose checksum is
+// sink.Checksum() of all that follows the header.  Entries take slots in the
+// order of their keys, so that the table is the same for the same entries
+// whatever order they were added in.  The entries go out before the table,
+// so that each is read once, in slot order, and the table filled in as they
+// go.
 template <class Sink>
 void CacheWriter::Stream(Sink &sink, std::span<const uint8_t, 16> signature, std::string_view buildDate) const {
    // The order of the keys: by their first eight bytes (read big-endian, so
    // that the numbers compare as the bytes do), then by the whole keys.
    struct Sorted {
       uint64_t prefix;
-      uint32_t entry;
+      uint32_t entry, home;
    };
    std::vector<Sorted> sorted(count_);
    for (size_t n = 0; n < count_; n++) {
@@ -270,7 +273,7 @@ void CacheWriter::Stream(Sink &sink, std::span<const uint8_t, 16> signature, std
       std::memcpy(first, e.bytes + kEntryHeadSize, std::min<size_t>(e.keyLen, 8));
       uint64_t prefix = 0;
       for (uint8_t b : first) prefix = prefix << 8 | b;
-      sorted[n] = {prefix, uint32_t(n)};
+      sorted[n] = {prefix, uint32_t(n), e.home};
    }
    auto keyOf = [this](uint32_t n) {
       const Entry &e = At(n);
@@ -281,38 +284,33 @@ void CacheWriter::Stream(Sink &sink, std::span<const uint8_t, 16> signature, std
       return KeyLess(keyOf(a.entry), keyOf(b.entry));
    });
 
+   // The slot table as the file holds it.  Until the entries go out, a
+   // taken slot holds its entry's number + 1 where its offset goes.
    const uint64_t slots = SlotCountFor(count_);
-   constexpr uint32_t kEmpty = 0xffffffff;
-   std::vector<uint32_t> slotted(slots, kEmpty);
+   std::vector<uint8_t> table(slots * kSlotSize, 0);
    for (const Sorted &s : sorted) {
-      uint64_t i = At(s.entry).home & (slots - 1);
-      while (slotted[i] != kEmpty) i = (i + 1) & (slots - 1);
-      slotted[i] = s.entry;
+      uint64_t i = s.home & (slots - 1);
+      while (LoadU32(&table[i * kSlotSize + 4]) != 0) i = (i + 1) & (slots - 1);
+      StoreU32(&table[i * kSlotSize + 4], s.entry + 1);
    }
    sorted = {};
 
    const uint64_t entryArea = kHeaderSize + slots * kSlotSize;
-   const uint64_t total = entryArea + totalBytes_;
-   auto put = [&sink](const uint8_t *p, size_t n) { sink.Put(p, n); };
-   // The slot table, then each entry's bytes in slot order.
    uint64_t at = entryArea;
-   for (uint32_t n : slotted) {
-      uint8_t slot[kSlotSize] = {};
-      if (n != kEmpty) {
-         const Entry &e = At(n);
-         StoreU32(slot, e.tag);
-         StoreU32(slot + 4, uint32_t(at));
-         StoreU32(slot + 8, e.keyLen);
-         StoreU32(slot + 12, e.dataLen);
-         at += kEntryHeadSize + e.keyLen + e.dataLen;
-      }
-      put(slot, kSlotSize);
+   for (uint64_t i = 0; i < slots; i++) {
+      uint8_t *slot = &table[i * kSlotSize];
+      uint32_t taken = LoadU32(slot + 4);
+      if (taken == 0) continue;
+      const Entry &e = At(taken - 1);
+      StoreU32(slot, e.tag);
+      StoreU32(slot + 4, uint32_t(at));
+      StoreU32(slot + 8, e.keyLen);
+      StoreU32(slot + 12, e.dataLen);
+      sink.Append(e.bytes, kEntryHeadSize + e.keyLen + e.dataLen);
+      at += kEntryHeadSize + e.keyLen + e.dataLen;
    }
-   for (uint32_t n : slotted) {
-      if (n == kEmpty) continue;
-      const Entry &e = At(n);
-      put(e.bytes, kEntryHeadSize + e.keyLen + e.dataLen);
-   }
+   sink.Place(kHeaderSize, table.data(), table.size());
+   table = {};
 
    uint8_t head[kHeaderSize] = {};
    std::memcpy(head, kCacheMagic, 8);
@@ -323,13 +321,13 @@ void CacheWriter::Stream(Sink &sink, std::span<const uint8_t, 16> signature, std
    if (!date.empty()) std::memcpy(head + 32, date.data(), date.size());
    StoreU32(head + 56, uint32_t(count_));
    StoreU32(head + 60, uint32_t(kHeaderSize));
-   StoreU64(head + 64, total);
+   StoreU64(head + 64, at);
    StoreU64(head + 72, sink.Checksum());
    StoreU32(head + 80, uint32_t(slots));
    StoreU32(head + 84, uint32_t(entryArea));
    StoreU32(head + 88, 0);
    StoreU32(head + kHeaderCheckOffset, HeaderCheck(head));
-   sink.Header(head);
+   sink.Place(0, head, kHeaderSize);
 }
 
 // The size of the file for these entries.
@@ -340,27 +338,30 @@ static uint64_t FileSize(size_t count, uint64_t entryBytes) {
 std::string CacheWriter::Finish(std::span<const uint8_t, 16> signature, std::string_view buildDate) const {
    struct ToText {
       std::string out;
-      void Put(const uint8_t *p, size_t n) { out.append(reinterpret_cast<const char *>(p), n); }
+      size_t end;  // where the next entry goes
+      void Append(const uint8_t *p, size_t n) {
+         std::memcpy(out.data() + end, p, n);
+         end += n;
+      }
+      void Place(uint64_t offset, const uint8_t *p, size_t n) { std::memcpy(out.data() + offset, p, n); }
       uint64_t Checksum() const {
          return kelplat::Checksum(reinterpret_cast<const uint8_t *>(out.data()) + kHeaderSize, out.size() - kHeaderSize);
       }
-      void Header(const uint8_t *head) { out.replace(0, kHeaderSize, reinterpret_cast<const char *>(head), kHeaderSize); }
-   } text;
-   text.out.reserve(FileSize(count_, totalBytes_));
-   text.out.assign(kHeaderSize, '\0');
+   } text{std::string(FileSize(count_, totalBytes_), '\0'), kHeaderSize + SlotCountFor(count_) * kSlotSize};
    Stream(text, signature, buildDate);
    return std::move(text.out);
 }
 
-// Writes all of bytes to fd; false with errno set.
-static bool WriteAll(int fd, const uint8_t *p, size_t n) {
+// Writes all of bytes to fd at offset; false with errno set.
+static bool WriteAllAt(int fd, const uint8_t *p, size_t n, uint64_t offset) {
    while (n > 0) {
-      ssize_t done = write(fd, p, n);
+      ssize_t done = pwrite(fd, p, n, off_t(offset));
       if (done < 0 && errno == EINTR) continue;
       if (done == 0) errno = EIO;
       if (done <= 0) return false;
       p += done;
       n -= size_t(done);
+      offset += uint64_t(done);
    }
    return true;
 }
@@ -371,14 +372,15 @@ bool CacheWriter::WriteTo(int fd, std::span<const uint8_t, 16> signature, std::s
       errno = EFBIG;
       return false;
    }
-   // Bytes gather in the buffer and go out a buffer at a time; a piece
-   // larger than the buffer goes out directly.  The checksum covers what
-   // goes out after the header.  After the first failure nothing more is
-   // written.
+   // Entries gather in the buffer and go out a buffer at a time; a piece
+   // larger than the buffer goes out directly.  The checksum is taken from
+   // the file once all but the header is there, read back through the same
+   // buffer.  After the first failure nothing more is written.
    struct ToFile {
       int fd;
+      uint64_t total;
       std::vector<uint8_t> buf;
-      StreamChecksum sum;
+      uint64_t end;  // where the buffer's bytes go
       size_t used = 0;
       bool ok = true;
       int error = 0;
@@ -387,46 +389,41 @@ bool CacheWriter::WriteTo(int fd, std::span<const uint8_t, 16> signature, std::s
          ok = false;
       }
       bool Flush() {
-         if (ok && used > 0) {
-            if (WriteAll(fd, buf.data(), used))
-               sum.Update(buf.data(), used);
-            else
-               Fail();
-         }
+         if (ok && used > 0 && !WriteAllAt(fd, buf.data(), used, end)) Fail();
+         end += used;
          used = 0;
          return ok;
       }
-      void Put(const uint8_t *p, size_t n) {
+      void Append(const uint8_t *p, size_t n) {
          if (!ok) return;
          if (n > buf.size() - used && !Flush()) return;
          if (n >= buf.size()) {
-            if (WriteAll(fd, p, n))
-               sum.Update(p, n);
-            else
-               Fail();
+            if (!WriteAllAt(fd, p, n, end)) Fail();
+            end += n;
             return;
          }
          std::memcpy(buf.data() + used, p, n);
          used += n;
       }
+      void Place(uint64_t offset, const uint8_t *p, size_t n) {
+         if (Flush() && !WriteAllAt(fd, p, n, offset)) Fail();
+      }
       uint64_t Checksum() {
-         Flush();
+         StreamChecksum sum(total - kHeaderSize);
+         for (uint64_t at = kHeaderSize; ok && at < total;) {
+            ssize_t got = pread(fd, buf.data(), size_t(std::min<uint64_t>(buf.size(), total - at)), off_t(at));
+            if (got < 0 && errno == EINTR) continue;
+            if (got == 0) errno = EIO;
+            if (got <= 0) {
+               Fail();
+               break;
+            }
+            sum.Update(buf.data(), size_t(got));
+            at += uint64_t(got);
+         }
          return sum.Final();
       }
-      void Header(const uint8_t *head) {
-         if (!Flush()) return;
-         for (size_t done = 0; ok && done < kHeaderSize;) {
-            ssize_t n = pwrite(fd, head + done, kHeaderSize - done, off_t(done));
-            if (n < 0 && errno == EINTR) continue;
-            if (n == 0) errno = EIO;
-            if (n <= 0) Fail();
-            else done += size_t(n);
-         }
-      }
-   } file{fd, std::vector<uint8_t>(size_t(1) << 18), StreamChecksum(total - kHeaderSize)};
-   // The header's place first; its bytes come last.
-   const uint8_t zeros[kHeaderSize] = {};
-   if (!WriteAll(fd, zeros, kHeaderSize)) return false;
+   } file{fd, total, std::vector<uint8_t>(size_t(1) << 18), kHeaderSize + SlotCountFor(count_) * kSlotSize};
    Stream(file, signature, buildDate);
    if (!file.ok) errno = file.error;
    return file.ok;

@@ -149,10 +149,11 @@ public:
    bool Add(std::string_view lookup, uint32_t status, std::string_view data);
    // The file bytes; the build date is cut to kBuildDateMax characters.
    std::string Finish(std::span<const uint8_t, 16> signature, std::string_view buildDate) const;
-   // Writes the same bytes to fd, a regular file open for writing at its
-   // start: everything after the header in one pass, then the header (which
-   // holds the checksum of the rest) at offset 0.  False with errno set when
-   // a write fails or the file would outgrow 32-bit offsets.
+   // Writes the same bytes to fd, a new regular file open for reading and
+   // writing: the entries through a modest buffer, then the slot table, then
+   // the header (which holds the checksum of the rest, read back from the
+   // file).  False with errno set when a write fails or the file would
+   // outgrow 32-bit offsets.
    bool WriteTo(int fd, std::span<const uint8_t, 16> signature, std::string_view buildDate) const;
    size_t size() const { return count_; }
 
