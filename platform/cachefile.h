@@ -137,8 +137,9 @@ constexpr int kCacheQuickOpen = 0x100;
 // key, data) back to back in large blocks, with a small fixed-size record
 // each; a key added twice is found through an open-addressing table of
 // entry numbers tagged with the key's hash, so no key is copied twice.  The
-// file is made only when it is written: streamed through a modest buffer,
-// so that its bytes are never all in memory at once.
+// file is made only at the end: WriteTo streams it to a file through a
+// modest buffer, so that its bytes are never all in memory at once; Finish
+// makes it as one string.
 class CacheWriter {
 public:
    CacheWriter() = default;
