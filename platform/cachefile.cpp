@@ -171,64 +171,277 @@ static uint64_t SlotCountFor(size_t n) {
    return s;
 }
 
-bool CacheWriter::Add(std::string lookup, uint32_t status, std::string data) {
-   if (!keys_.insert(lookup).second) return false;
-   entries_.push_back({std::move(lookup), status, std::move(data)});
+// Checksum() over bytes given in pieces of any length, for a total length
+// known from the start.
+class StreamChecksum {
+public:
+   explicit StreamChecksum(uint64_t total) : h_(0x9e3779b97f4a7c15ULL ^ total) {}
+   void Update(const uint8_t *p, size_t n) {
+      if (pendingLen_ > 0) {
+         size_t take = std::min(n, 8 - pendingLen_);
+         std::memcpy(pending_ + pendingLen_, p, take);
+         pendingLen_ += take;
+         p += take;
+         n -= take;
+         if (pendingLen_ < 8) return;
+         Word(pending_);
+         pendingLen_ = 0;
+      }
+      for (; n >= 8; p += 8, n -= 8) Word(p);
+      std::memcpy(pending_, p, n);
+      pendingLen_ = n;
+   }
+   uint64_t Final() const {
+      uint64_t h = h_;
+      for (size_t i = 0; i < pendingLen_; i++) h = (h ^ pending_[i]) * 0x100000001b3ULL;
+      h ^= h >> 33;
+      return h * 0xc4ceb9fe1a85ec53ULL;
+   }
+
+private:
+   void Word(const uint8_t *p) {
+      h_ = (h_ ^ LoadU64(p)) * 0xff51afd7ed558ccdULL;
+      h_ ^= h_ >> 29;
+   }
+   uint64_t h_;
+   uint8_t pending_[8];
+   size_t pendingLen_ = 0;
+};
+
+uint8_t *CacheWriter::Allocate(size_t n) {
+   if (n > freeLen_) {
+      // A large entry gets a block of its own; the current block stays in use.
+      if (n > kByteBlock / 4) {
+         byteBlocks_.emplace_back(new uint8_t[n]);
+         return byteBlocks_.back().get();
+      }
+      byteBlocks_.emplace_back(new uint8_t[kByteBlock]);
+      free_ = byteBlocks_.back().get();
+      freeLen_ = kByteBlock;
+   }
+   uint8_t *at = free_;
+   free_ += n;
+   freeLen_ -= n;
+   return at;
+}
+
+// The index's place for a tag: the tag's top bits, spread.
+static size_t IndexHome(uint32_t tag, size_t mask) { return size_t(uint32_t(tag * 0x9e3779b1u)) & mask; }
+
+void CacheWriter::GrowIndex() {
+   std::vector<uint64_t> grown(std::max<size_t>(index_.size() * 2, 1024), 0);
+   const size_t mask = grown.size() - 1;
+   for (uint64_t v : index_) {
+      if (v == 0) continue;
+      size_t i = IndexHome(uint32_t(v >> 32), mask);
+      while (grown[i] != 0) i = (i + 1) & mask;
+      grown[i] = v;
+   }
+   index_ = std::move(grown);
+}
+
+bool CacheWriter::Add(std::string_view lookup, uint32_t status, std::string_view data) {
+   const uint32_t tag = uint32_t(KeyHash(lookup) >> 32);
+   if ((count_ + 1) * 4 > index_.size() * 3) GrowIndex();
+   const size_t mask = index_.size() - 1;
+   size_t i = IndexHome(tag, mask);
+   for (; index_[i] != 0; i = (i + 1) & mask) {
+      if (uint32_t(index_[i] >> 32) != tag) continue;
+      const Entry &e = At(size_t(uint32_t(index_[i])) - 1);
+      if (e.keyLen == lookup.size() && std::memcmp(e.bytes + kEntryHeadSize, lookup.data(), lookup.size()) == 0)
+         return false;
+   }
+   if ((count_ & (kEntryBlock - 1)) == 0) entryBlocks_.emplace_back(new Entry[kEntryBlock]);
+   const size_t size = kEntryHeadSize + lookup.size() + data.size();
+   uint8_t *bytes = Allocate(size);
+   StoreU32(bytes, status);
+   if (!lookup.empty()) std::memcpy(bytes + kEntryHeadSize, lookup.data(), lookup.size());
+   if (!data.empty()) std::memcpy(bytes + kEntryHeadSize + lookup.size(), data.data(), data.size());
+   entryBlocks_.back()[count_ & (kEntryBlock - 1)] = {bytes, uint32_t(lookup.size()), uint32_t(data.size()), tag,
+                                                      uint32_t(HomeHash(lookup))};
+   index_[i] = uint64_t(tag) << 32 | uint64_t(count_ + 1);
+   count_++;
+   totalBytes_ += size;
    return true;
 }
 
-std::string CacheWriter::Finish(std::span<const uint8_t, 16> signature,
-                                std::string_view buildDate) const {
-   std::vector<const Entry *> sorted;
-   sorted.reserve(entries_.size());
-   for (const Entry &e : entries_) sorted.push_back(&e);
-   std::sort(sorted.begin(), sorted.end(),
-             [](const Entry *a, const Entry *b) { return KeyLess(a->key, b->key); });
+// Makes the file through sink: sink.Append(bytes, n) gives the entries'
+// bytes in file order, from the end of the slot table on; sink.Place(offset,
+// bytes, n) then gives the slot table and last the header, whose checksum is
+// sink.Checksum() of all that follows the header.  Entries take slots in the
+// order of their keys, so that the table is the same for the same entries
+// whatever order they were added in.  The entries go out before the table,
+// so that each is read once, in slot order, and the table filled in as they
+// go.
+template <class Sink>
+void CacheWriter::Stream(Sink &sink, std::span<const uint8_t, 16> signature, std::string_view buildDate) const {
+   // The order of the keys: by their first eight bytes (read big-endian, so
+   // that the numbers compare as the bytes do), then by the whole keys.
+   struct Sorted {
+      uint64_t prefix;
+      uint32_t entry, home;
+   };
+   std::vector<Sorted> sorted(count_);
+   for (size_t n = 0; n < count_; n++) {
+      const Entry &e = At(n);
+      uint8_t first[8] = {};
+      std::memcpy(first, e.bytes + kEntryHeadSize, std::min<size_t>(e.keyLen, 8));
+      uint64_t prefix = 0;
+      for (uint8_t b : first) prefix = prefix << 8 | b;
+      sorted[n] = {prefix, uint32_t(n), e.home};
+   }
+   auto keyOf = [this](uint32_t n) {
+      const Entry &e = At(n);
+      return std::string_view(reinterpret_cast<const char *>(e.bytes) + kEntryHeadSize, e.keyLen);
+   };
+   std::sort(sorted.begin(), sorted.end(), [&](const Sorted &a, const Sorted &b) {
+      if (a.prefix != b.prefix) return a.prefix < b.prefix;
+      return KeyLess(keyOf(a.entry), keyOf(b.entry));
+   });
 
-   const uint64_t slots = SlotCountFor(sorted.size());
-   // Slots first (in key order, so that the table is the same for the same
-   // entries), then each entry's bytes in slot order.
-   std::vector<const Entry *> slotted(slots, nullptr);
-   size_t total = kHeaderSize + slots * kSlotSize;
-   for (const Entry *e : sorted) {
-      uint64_t i = HomeHash(e->key) & (slots - 1);
-      while (slotted[i] != nullptr) i = (i + 1) & (slots - 1);
-      slotted[i] = e;
-      total += kEntryHeadSize + e->key.size() + e->data.size();
+   // The slot table as the file holds it.  Until the entries go out, a
+   // taken slot holds its entry's number + 1 where its offset goes.
+   const uint64_t slots = SlotCountFor(count_);
+   std::vector<uint8_t> table(slots * kSlotSize, 0);
+   for (const Sorted &s : sorted) {
+      uint64_t i = s.home & (slots - 1);
+      while (LoadU32(&table[i * kSlotSize + 4]) != 0) i = (i + 1) & (slots - 1);
+      StoreU32(&table[i * kSlotSize + 4], s.entry + 1);
    }
-   std::string out(total, '\0');
-   auto *head = reinterpret_cast<uint8_t *>(out.data());
-   size_t at = kHeaderSize + slots * kSlotSize;
+   sorted = {};
+
+   const uint64_t entryArea = kHeaderSize + slots * kSlotSize;
+   uint64_t at = entryArea;
    for (uint64_t i = 0; i < slots; i++) {
-      const Entry *e = slotted[i];
-      if (e == nullptr) continue;
-      uint8_t *slot = head + kHeaderSize + i * kSlotSize;
-      StoreU32(slot, uint32_t(KeyHash(e->key) >> 32));
+      uint8_t *slot = &table[i * kSlotSize];
+      uint32_t taken = LoadU32(slot + 4);
+      if (taken == 0) continue;
+      const Entry &e = At(taken - 1);
+      StoreU32(slot, e.tag);
       StoreU32(slot + 4, uint32_t(at));
-      StoreU32(slot + 8, uint32_t(e->key.size()));
-      StoreU32(slot + 12, uint32_t(e->data.size()));
-      StoreU32(head + at, e->status);
-      at += kEntryHeadSize;
-      std::memcpy(head + at, e->key.data(), e->key.size());
-      at += e->key.size();
-      if (!e->data.empty()) std::memcpy(head + at, e->data.data(), e->data.size());
-      at += e->data.size();
+      StoreU32(slot + 8, e.keyLen);
+      StoreU32(slot + 12, e.dataLen);
+      sink.Append(e.bytes, kEntryHeadSize + e.keyLen + e.dataLen);
+      at += kEntryHeadSize + e.keyLen + e.dataLen;
    }
+   sink.Place(kHeaderSize, table.data(), table.size());
+   table = {};
+
+   uint8_t head[kHeaderSize] = {};
    std::memcpy(head, kCacheMagic, 8);
    StoreU32(head + 8, kCacheVersion);
    StoreU32(head + 12, 0);
    std::memcpy(head + 16, signature.data(), 16);
    std::string_view date = buildDate.substr(0, kBuildDateMax);
    if (!date.empty()) std::memcpy(head + 32, date.data(), date.size());
-   StoreU32(head + 56, uint32_t(sorted.size()));
+   StoreU32(head + 56, uint32_t(count_));
    StoreU32(head + 60, uint32_t(kHeaderSize));
-   StoreU64(head + 64, out.size());
-   StoreU64(head + 72, Checksum(head + kHeaderSize, out.size() - kHeaderSize));
+   StoreU64(head + 64, at);
+   StoreU64(head + 72, sink.Checksum());
    StoreU32(head + 80, uint32_t(slots));
-   StoreU32(head + 84, uint32_t(kHeaderSize + slots * kSlotSize));
+   StoreU32(head + 84, uint32_t(entryArea));
    StoreU32(head + 88, 0);
    StoreU32(head + kHeaderCheckOffset, HeaderCheck(head));
-   return out;
+   sink.Place(0, head, kHeaderSize);
+}
+
+// The size of the file for these entries.
+static uint64_t FileSize(size_t count, uint64_t entryBytes) {
+   return kHeaderSize + SlotCountFor(count) * kSlotSize + entryBytes;
+}
+
+std::string CacheWriter::Finish(std::span<const uint8_t, 16> signature, std::string_view buildDate) const {
+   struct ToText {
+      std::string out;
+      size_t end;  // where the next entry goes
+      void Append(const uint8_t *p, size_t n) {
+         std::memcpy(out.data() + end, p, n);
+         end += n;
+      }
+      void Place(uint64_t offset, const uint8_t *p, size_t n) { std::memcpy(out.data() + offset, p, n); }
+      uint64_t Checksum() const {
+         return kelplat::Checksum(reinterpret_cast<const uint8_t *>(out.data()) + kHeaderSize, out.size() - kHeaderSize);
+      }
+   } text{std::string(FileSize(count_, totalBytes_), '\0'), kHeaderSize + SlotCountFor(count_) * kSlotSize};
+   Stream(text, signature, buildDate);
+   return std::move(text.out);
+}
+
+// Writes all of bytes to fd at offset; false with errno set.
+static bool WriteAllAt(int fd, const uint8_t *p, size_t n, uint64_t offset) {
+   while (n > 0) {
+      ssize_t done = pwrite(fd, p, n, off_t(offset));
+      if (done < 0 && errno == EINTR) continue;
+      if (done == 0) errno = EIO;
+      if (done <= 0) return false;
+      p += done;
+      n -= size_t(done);
+      offset += uint64_t(done);
+   }
+   return true;
+}
+
+bool CacheWriter::WriteTo(int fd, std::span<const uint8_t, 16> signature, std::string_view buildDate) const {
+   const uint64_t total = FileSize(count_, totalBytes_);
+   if (total > kMaxCacheFileSize) {
+      errno = EFBIG;
+      return false;
+   }
+   // Entries gather in the buffer and go out a buffer at a time; a piece
+   // larger than the buffer goes out directly.  The checksum is taken from
+   // the file once all but the header is there, read back through the same
+   // buffer.  After the first failure nothing more is written.
+   struct ToFile {
+      int fd;
+      uint64_t total;
+      std::vector<uint8_t> buf;
+      uint64_t end;  // where the buffer's bytes go
+      size_t used = 0;
+      bool ok = true;
+      int error = 0;
+      void Fail() {
+         if (ok) error = errno;
+         ok = false;
+      }
+      bool Flush() {
+         if (ok && used > 0 && !WriteAllAt(fd, buf.data(), used, end)) Fail();
+         end += used;
+         used = 0;
+         return ok;
+      }
+      void Append(const uint8_t *p, size_t n) {
+         if (!ok) return;
+         if (n > buf.size() - used && !Flush()) return;
+         if (n >= buf.size()) {
+            if (!WriteAllAt(fd, p, n, end)) Fail();
+            end += n;
+            return;
+         }
+         std::memcpy(buf.data() + used, p, n);
+         used += n;
+      }
+      void Place(uint64_t offset, const uint8_t *p, size_t n) {
+         if (Flush() && !WriteAllAt(fd, p, n, offset)) Fail();
+      }
+      uint64_t Checksum() {
+         StreamChecksum sum(total - kHeaderSize);
+         for (uint64_t at = kHeaderSize; ok && at < total;) {
+            ssize_t got = pread(fd, buf.data(), size_t(std::min<uint64_t>(buf.size(), total - at)), off_t(at));
+            if (got < 0 && errno == EINTR) continue;
+            if (got == 0) errno = EIO;
+            if (got <= 0) {
+               Fail();
+               break;
+            }
+            sum.Update(buf.data(), size_t(got));
+            at += uint64_t(got);
+         }
+         return sum.Final();
+      }
+   } file{fd, total, std::vector<uint8_t>(size_t(1) << 18), kHeaderSize + SlotCountFor(count_) * kSlotSize};
+   Stream(file, signature, buildDate);
+   if (!file.ok) errno = file.error;
+   return file.ok;
 }
 
 CacheReader::~CacheReader() { Close(); }

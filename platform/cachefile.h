@@ -51,6 +51,7 @@
 #include <cstdint>
 #include <algorithm>
 #include <cstring>
+#include <memory>
 #include <optional>
 #include <span>
 #include <string>
@@ -160,23 +161,60 @@ uint32_t HeaderCheck(const uint8_t *header);
 // opening needs, in time independent of the file's size.
 constexpr int kCacheQuickOpen = 0x100;
 
-// Builds a cache file in memory.
+// Builds a cache file.  Entries are kept as the file stores them (status,
+// key, data) back to back in large blocks, with a small fixed-size record
+// each; a key added twice is found through an open-addressing table of
+// entry numbers tagged with the key's hash, so no key is copied twice.  The
+// file is made only at the end: WriteTo streams it to a file through a
+// modest buffer, so that its bytes are never all in memory at once; Finish
+// makes it as one string.
 class CacheWriter {
 public:
+   CacheWriter() = default;
+   CacheWriter(const CacheWriter &) = delete;
+   CacheWriter &operator=(const CacheWriter &) = delete;
+
    // False when the same lookup key was added before.
-   bool Add(std::string lookup, uint32_t status, std::string data);
+   bool Add(std::string_view lookup, uint32_t status, std::string_view data);
    // The file bytes; the build date is cut to kBuildDateMax characters.
    std::string Finish(std::span<const uint8_t, 16> signature, std::string_view buildDate) const;
-   size_t size() const { return entries_.size(); }
+   // Writes the same bytes to fd, a new regular file open for reading and
+   // writing: the entries through a modest buffer, then the slot table, then
+   // the header (which holds the checksum of the rest, read back from the
+   // file).  False with errno set when a write fails or the file would
+   // outgrow 32-bit offsets.
+   bool WriteTo(int fd, std::span<const uint8_t, 16> signature, std::string_view buildDate) const;
+   size_t size() const { return count_; }
 
 private:
+   // One entry: where its bytes lie, their lengths, and its hashes (the tag
+   // a slot stores, and the hash that picks its first slot).
    struct Entry {
-      std::string key;
-      uint32_t status;
-      std::string data;
+      const uint8_t *bytes;  // status, key, data
+      uint32_t keyLen, dataLen;
+      uint32_t tag, home;
    };
-   std::vector<Entry> entries_;
-   std::unordered_set<std::string> keys_;
+   static constexpr size_t kEntryBlockBits = 16;
+   static constexpr size_t kEntryBlock = size_t(1) << kEntryBlockBits;
+   static constexpr size_t kByteBlock = size_t(1) << 20;
+
+   const Entry &At(size_t i) const { return entryBlocks_[i >> kEntryBlockBits][i & (kEntryBlock - 1)]; }
+   uint8_t *Allocate(size_t n);
+   void GrowIndex();
+   template <class Sink>
+   void Stream(Sink &sink, std::span<const uint8_t, 16> signature, std::string_view buildDate) const;
+
+   // Entries in blocks of kEntryBlock, so that growing never copies them.
+   std::vector<std::unique_ptr<Entry[]>> entryBlocks_;
+   size_t count_ = 0;
+   // The entry bytes: blocks of kByteBlock, a larger entry in a block of its own.
+   std::vector<std::unique_ptr<uint8_t[]>> byteBlocks_;
+   uint8_t *free_ = nullptr;
+   size_t freeLen_ = 0;
+   // Open addressing with linear probing: (tag << 32) | (entry number + 1),
+   // 0 for an empty place; at most three quarters full.
+   std::vector<uint64_t> index_;
+   uint64_t totalBytes_ = 0;  // of all entries, as the file stores them
 };
 
 // One looked-up entry of an open cache.

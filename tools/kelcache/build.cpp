@@ -4,6 +4,7 @@
 #include <memory>
 #include <unordered_set>
 
+#include "byteset.h"
 #include "content.h"
 #include "nodetree.h"
 #include "records.h"
@@ -69,7 +70,7 @@ private:
       bool operator()(size_t a, size_t b) const { return Name(*members, a) == Name(*members, b); }
    };
    using IndexSet = std::unordered_set<size_t, IndexHash, IndexEqual>;
-   static constexpr size_t kLinearMembers = 8;
+   static constexpr size_t kLinearMembers = 16;
 
    struct Frame {
       Json *container;
@@ -149,9 +150,13 @@ Key MetaKey(std::string_view name) { return Key{KEL_PARAM_STRING, 0, std::string
 
 class Builder {
 public:
+   // Entries go to cache->writer; the header's fields to the others.
+   explicit Builder(SnapshotCache &cache) : cache_(cache) {
+      cache_.signature = DefaultSignature();
+      cache_.buildDate = "unknown";
+   }
    // A member of the snapshot's top level; "tree" is walked by Walk.
    void TopMember(const std::string &name, Json &value);
-   std::string Finish() const { return writer_.Finish(signature_, date_); }
 
    // The value at a position: a record, a data content, an object of
    // instances, or an object of fixed names.  null stores nothing.
@@ -179,7 +184,7 @@ public:
       std::optional<uint32_t> listStatus;
       bool noListing = false;
       std::vector<Key> listed;
-      std::unordered_set<std::string> seen;  // encoded keys
+      ByteSet seen;  // encoded keys
    };
    // The level below pos, or nothing when pos has fixed names.
    std::optional<Level> StartLevel(int pos) const {
@@ -193,26 +198,22 @@ public:
    void EndLevel(const Level &level, const std::string &path);
 
 private:
-   void Add(std::string lookup, uint32_t status, std::string data, const std::string &path) {
+   void Add(std::string_view lookup, uint32_t status, std::string_view data, const std::string &path) {
       // Each record and content is capped; so is their sum, so that no
       // snapshot makes a file of gigabytes.
       total_ += lookup.size() + data.size();
       if (total_ > kMaxCacheSize) Fail(path, "makes the cache file larger than 256 MiB");
-      // Records are made at their node's full size and then trimmed; the
-      // stored entry keeps only the bytes, not the spare capacity.
-      if (data.capacity() > data.size() + 64) data.shrink_to_fit();
-      if (!writer_.Add(std::move(lookup), status, std::move(data)))
+      if (!cache_.writer.Add(lookup, status, data))
          Fail(path, "makes an entry that another member made already");
    }
    void Simulator(const Json &value, const std::string &path);
    void RawEntries(const Json &value, const std::string &path);
 
    const NodeTree &tree_ = TheNodeTree();
-   kelplat::CacheWriter writer_;
+   SnapshotCache &cache_;
+   RecordCodec records_;
    std::vector<Key> keys_;  // the instance keys down to the current position
    uint64_t total_ = 0;
-   std::string date_ = "unknown";
-   std::array<uint8_t, 16> signature_ = DefaultSignature();
 };
 
 void Builder::TopMember(const std::string &name, Json &value) {
@@ -221,11 +222,11 @@ void Builder::TopMember(const std::string &name, Json &value) {
       std::string date = ReadText(value, p);
       if (date.size() > kelplat::kBuildDateMax) Fail(p, "longer than 20 characters");
       if (date.find('\0') != std::string::npos) Fail(p, "contains a NUL");
-      date_ = std::move(date);
+      cache_.buildDate = std::move(date);
    } else if (name == "signature") {
       std::string bytes = ReadHex(value, p);
-      if (bytes.size() != signature_.size()) Fail(p, "expected 32 hex digits");
-      std::copy(bytes.begin(), bytes.end(), signature_.begin());
+      if (bytes.size() != cache_.signature.size()) Fail(p, "expected 32 hex digits");
+      std::copy(bytes.begin(), bytes.end(), cache_.signature.begin());
    } else if (name == "tree") {
       Walk(0, value, p, false);
    } else if (name == "simulator") {
@@ -249,8 +250,8 @@ void Builder::Walk(int pos, Json &value, const std::string &path, bool instance)
       // A listed instance given as {} has nothing to read: its read answers
       // Not found, as one given as null.
       if (instance && IsEmptyInstance(value)) return;
-      RecordEntry r = EncodeRecord(*at.node, value, path, instance);
-      Add(kelplat::EncodeLookup(Op::Get, at.node->number, keys_), r.status, std::move(r.data), path);
+      RecordEntry r = records_.Encode(*at.node, value, path, instance);
+      Add(kelplat::EncodeLookup(Op::Get, at.node->number, keys_), r.status, r.data, path);
       if (r.setStatus) Add(kelplat::EncodeLookup(Op::Set, at.node->number, keys_), *r.setStatus, "", path);
       return;
    }
@@ -286,7 +287,7 @@ void Builder::LevelMember(Level &l, const std::string &name, Json &value, const 
    Key key = ParseKeyName(name, tree_.at(l.level).levelKind, p);
    std::string encoded;
    kelplat::AppendKey(encoded, key);
-   if (!l.seen.insert(encoded).second) Fail(p, "the same instance key as an earlier member");
+   if (!l.seen.Insert(encoded).second) Fail(p, "the same instance key as an earlier member");
    if (unlisted) unlisted = ReadBool(value.at("$unlisted"), MemberPath(p, "$unlisted"));
    if (!unlisted) l.listed.push_back(key);
    keys_.push_back(std::move(key));
@@ -372,26 +373,6 @@ void Builder::RawEntries(const Json &value, const std::string &path) {
    }
 }
 
-// Member names of one object, for a member given twice: a hash once the
-// object has more than a few.
-class NameSet {
-public:
-   bool Insert(const std::string &name) {
-      if (!hashed_.empty()) return hashed_.insert(name).second;
-      if (std::find(few_.begin(), few_.end(), name) != few_.end()) return false;
-      few_.push_back(name);
-      if (few_.size() > 8) {
-         hashed_.insert(few_.begin(), few_.end());
-         few_.clear();
-      }
-      return true;
-   }
-
-private:
-   std::vector<std::string> few_;
-   std::unordered_set<std::string> hashed_;
-};
-
 // Reads the snapshot and walks it as it is read.  The objects above the
 // instances (the top level, "tree", its fixed names and the objects of
 // instances) are taken member by member, and only one member's value at a
@@ -403,10 +384,9 @@ class StreamingReader {
 public:
    explicit StreamingReader(Builder &builder) : builder_(builder) {}
 
-   // The cache file, once the parser has read the whole text.
-   std::string Finish() {
+   // Once the parser has read the whole text: the walk's first mistake.
+   void Finish() {
       if (failed_) throw firstError_;
-      return builder_.Finish();
    }
 
    bool null() { return Forward([&] { value_.null(); }); }
@@ -439,7 +419,7 @@ private:
       int pos;           // its position (Fixed, Level)
       std::string path;  // its JSON path
       std::optional<Builder::Level> level;
-      NameSet names;
+      ByteSet names;  // for a member given twice
       std::string key, memberPath;  // the member being read
       int child = -1;                // its position (Fixed)
    };
@@ -500,7 +480,7 @@ bool StreamingReader::OpenFrame() {
 bool StreamingReader::key(std::string &name) {
    if (!value_.Idle()) return value_.key(name);
    Frame &f = frames_.back();
-   if (!f.names.Insert(name)) Fail(MemberPath(f.path, name), "member given twice");
+   if (!f.names.Insert(name).second) Fail(MemberPath(f.path, name), "member given twice");
    f.key = std::move(name);
    f.memberPath = MemberPath(f.path, f.key);
    if (f.kind == Kind::Fixed) Walk([&] { f.child = builder_.FixedMember(f.pos, f.key, f.memberPath); });
@@ -542,18 +522,17 @@ std::string WithoutTag(std::string_view what) {
 
 }  // namespace kelcache
 
-bool BuildCache(const std::string &jsonText, std::string *cacheBytes, std::string *error) {
+bool ReadSnapshot(const std::string &jsonText, SnapshotCache *cache, std::string *error) {
    using namespace kelcache;
    std::string message;
    try {
       if (!TheNodeTree().error.empty()) {
          message = "node table: " + TheNodeTree().error;
       } else {
-         Builder builder;
+         Builder builder(*cache);
          StreamingReader reader(builder);
          Json::sax_parse(jsonText, &reader);
-         std::string bytes = reader.Finish();
-         if (cacheBytes != nullptr) *cacheBytes = std::move(bytes);
+         reader.Finish();
          return true;
       }
    } catch (const SnapshotError &e) {
@@ -569,4 +548,17 @@ bool BuildCache(const std::string &jsonText, std::string *cacheBytes, std::strin
    }
    if (error != nullptr) *error = message;
    return false;
+}
+
+bool BuildCache(const std::string &jsonText, std::string *cacheBytes, std::string *error) {
+   SnapshotCache cache;
+   if (!ReadSnapshot(jsonText, &cache, error)) return false;
+   try {
+      std::string bytes = cache.writer.Finish(cache.signature, cache.buildDate);
+      if (cacheBytes != nullptr) *cacheBytes = std::move(bytes);
+      return true;
+   } catch (const std::bad_alloc &) {
+      if (error != nullptr) *error = "out of memory";
+      return false;
+   }
 }

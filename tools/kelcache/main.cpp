@@ -10,6 +10,8 @@
 #include <cerrno>
 #include <cstdio>
 #include <cstring>
+#include <functional>
+#include <new>
 #include <span>
 #include <string>
 #include <string_view>
@@ -129,6 +131,8 @@ bool ReadRegularFile(const char *path, std::string *bytes, std::string *problem)
       *problem = std::strerror(errno);
    else if (!S_ISREG(st.st_mode))
       *problem = "not a regular file";
+   // Room for the whole file at once, so that the text is not copied as it grows.
+   if (ok && S_ISREG(st.st_mode)) bytes->reserve(size_t(st.st_size));
    ok = ok && S_ISREG(st.st_mode) && ReadToEnd(fd, bytes, problem);
    close(fd);
    return ok;
@@ -145,12 +149,12 @@ bool WriteAll(int fd, const std::string &bytes) {
    return true;
 }
 
-// Replaces the regular file at path, or makes it.  The bytes go to a new
-// temporary in the same folder (mkstemp creates it, so no link is followed
+// Replaces the regular file at path, or makes it.  fill writes the bytes to
+// a new temporary in the same folder (mkstemp creates it, so no link is followed
 // and nothing that exists is reused), which is then renamed over path: a
 // failed run leaves the old file as it was.  Anything else at path (a link,
 // a folder, a FIFO, a device) is refused, never replaced.
-bool WriteCacheFile(const std::string &path, const std::string &bytes, std::string *problem) {
+bool WriteCacheFile(const std::string &path, const std::function<bool(int fd)> &fill, std::string *problem) {
    struct stat st;
    if (lstat(path.c_str(), &st) == 0) {
       if (!S_ISREG(st.st_mode)) {
@@ -172,7 +176,7 @@ bool WriteCacheFile(const std::string &path, const std::string &bytes, std::stri
    // mkstemp makes the file private; a cache file gets the usual mode.
    mode_t mask = umask(0);
    umask(mask);
-   bool ok = fchmod(fd, 0666 & ~mask) == 0 && WriteAll(fd, bytes);
+   bool ok = fchmod(fd, 0666 & ~mask) == 0 && fill(fd);
    int error = ok ? 0 : errno;
    if (close(fd) != 0 && ok) {
       ok = false;
@@ -186,6 +190,10 @@ bool WriteCacheFile(const std::string &path, const std::string &bytes, std::stri
    unlink(name.c_str());
    *problem = std::strerror(error);
    return false;
+}
+
+bool WriteBytesAsCacheFile(const std::string &path, const std::string &bytes, std::string *problem) {
+   return WriteCacheFile(path, [&bytes](int fd) { return WriteAll(fd, bytes); }, problem);
 }
 
 int Build(Args args) {
@@ -205,17 +213,29 @@ int Build(Args args) {
    }
    if (input.empty() || !haveOutput) return Usage("build needs a snapshot and -o FILE");
 
-   std::string json, bytes, problem;
+   std::string json, problem;
    bool read = input == "-" ? ReadToEnd(STDIN_FILENO, &json, &problem) : ReadRegularFile(input.c_str(), &json, &problem);
    if (!read) {
       std::fprintf(stderr, "kelcache: %s: %s\n", input == "-" ? "standard input" : input.c_str(), problem.c_str());
       return 1;
    }
-   if (!BuildCache(json, &bytes, &problem)) {
+   SnapshotCache cache;
+   if (!ReadSnapshot(json, &cache, &problem)) {
       std::fprintf(stderr, "kelcache: %s\n", problem.c_str());
       return 1;
    }
-   if (!WriteCacheFile(output, bytes, &problem)) {
+   // The text is no longer needed: its memory serves the writing (a swap,
+   // as assigning an empty string would keep the capacity).
+   std::string().swap(json);
+   auto fill = [&cache](int fd) {
+      try {
+         return cache.writer.WriteTo(fd, cache.signature, cache.buildDate);
+      } catch (const std::bad_alloc &) {
+         errno = ENOMEM;
+         return false;
+      }
+   };
+   if (!WriteCacheFile(output, fill, &problem)) {
       std::fprintf(stderr, "kelcache: %s: %s\n", output.c_str(), problem.c_str());
       return 1;
    }
@@ -240,16 +260,15 @@ int Dump(Args args) {
    // The dump verifies the whole file itself.
    kelplat::CacheReader reader;
    if (!OpenCache(path, kelplat::kCacheQuickOpen, &reader)) return 1;
-   std::string json, error;
-   if (!DumpCache(reader.Bytes(), &json, &error)) {
+   std::string error;
+   if (!DumpCacheTo(reader.Bytes(), stdout, &error)) {
       std::fprintf(stderr, "kelcache: %s: %s\n", path, error.c_str());
       return 1;
    }
-   std::fwrite(json.data(), 1, json.size(), stdout);
    return Flushed();
 }
 
-int Capture(Args args) { return RunCapture(args, WriteCacheFile); }
+int Capture(Args args) { return RunCapture(args, WriteBytesAsCacheFile); }
 
 int Verify(Args args) {
    if (args.size() != 1) return Usage("verify needs exactly one cache file");

@@ -165,44 +165,10 @@ IntType IntTypeOf(FieldType type) {
    }
 }
 
-void PutUint(std::string &buf, size_t offset, size_t size, uint64_t v) {
-   for (size_t i = 0; i < size; i++) buf[offset + i] = char(uint8_t(v >> (8 * i)));
-}
-
 uint64_t GetUint(std::string_view buf, size_t offset, size_t size) {
    uint64_t v = 0;
    for (size_t i = 0; i < size; i++) v |= uint64_t(uint8_t(buf[offset + i])) << (8 * i);
    return v;
-}
-
-void PutBytes(std::string &buf, const Field &f, std::string_view bytes, const std::string &path) {
-   if (bytes.size() > f.width)
-      Fail(path, std::to_string(bytes.size()) + " bytes do not fit the field's " + std::to_string(f.width));
-   std::copy(bytes.begin(), bytes.end(), buf.begin() + f.offset);
-}
-
-// Lays one field over buf.  A text writes its bytes and, when it is shorter
-// than the field, one NUL: any other bytes come from "$raw".
-void PutField(std::string &buf, const Field &f, const Json &value, const std::string &path) {
-   switch (f.type) {
-   case Text: {
-      const std::string &text = ReadText(value, path);
-      if (text.size() > f.width)
-         Fail(path, "text of " + std::to_string(text.size()) + " bytes is longer than the field (" +
-                       std::to_string(f.width) + " bytes)");
-      std::copy(text.begin(), text.end(), buf.begin() + f.offset);
-      if (text.size() < f.width) buf[f.offset + text.size()] = '\0';
-      return;
-   }
-   case Hex:
-   case Mac: PutBytes(buf, f, ReadHex(value, path), path); return;
-   default: PutUint(buf, f.offset, FieldSize(f), ReadInt(value, IntTypeOf(f.type), path));
-   }
-}
-
-void TrimZeros(std::string &bytes) {
-   size_t end = bytes.find_last_not_of('\0');
-   bytes.resize(end == std::string::npos ? 0 : end + 1);
 }
 
 std::string_view TrimmedZeros(std::string_view bytes) {
@@ -214,29 +180,32 @@ std::string_view TrimmedZeros(std::string_view bytes) {
 // bytes JSON cannot carry (texts that are not UTF-8) are left out.
 Json DecodeFields(const RecordDef &def, std::string_view buf) {
    Json out = Json::object();
+   // Each field once: appended without the ordered object's search.
+   Json::object_t &members = out.get_ref<Json::object_t &>();
+   members.reserve(def.fields.size());
    for (const Field &f : def.fields) {
-      std::string name(f.name);
       std::string_view bytes = buf.substr(f.offset, FieldSize(f));
+      auto put = [&](Json value) { members.emplace_back(std::string(f.name), std::move(value)); };
       switch (f.type) {
-      case I32: out[name] = int32_t(uint32_t(GetUint(buf, f.offset, 4))); break;
+      case I32: put(int32_t(uint32_t(GetUint(buf, f.offset, 4)))); break;
       case Text: {
          std::string_view text = bytes.substr(0, bytes.find('\0'));
-         if (ValidUtf8(text)) out[name] = std::string(text);
+         if (ValidUtf8(text)) put(std::string(text));
          break;
       }
       case Hex: {
          if (def.flags & kAcpiBuffer) break;  // the table bytes: below, as long as "length" says
          std::string_view used = TrimmedZeros(bytes);
-         if (!used.empty()) out[name] = ToHex(used);
+         if (!used.empty()) put(ToHex(used));
          break;
       }
       case Mac: {
          std::string hex = ToHex(bytes), text;
          for (size_t i = 0; i < hex.size(); i += 2) text += (i ? ":" : "") + hex.substr(i, 2);
-         out[name] = text;
+         put(text);
          break;
       }
-      default: out[name] = GetUint(buf, f.offset, FieldSize(f));
+      default: put(GetUint(buf, f.offset, FieldSize(f)));
       }
    }
    if (def.flags & kAcpiBuffer) {
@@ -259,26 +228,64 @@ const RecordDef *FindRecord(KEL_Node number) {
    return nullptr;
 }
 
-RecordEntry EncodeRecord(const kelplat::NodeInfo &node, const Json &value, const std::string &path,
-                         bool allowUnlisted) {
+void RecordCodec::Clear(size_t n) {
+   std::fill(buf_.begin(), buf_.begin() + ptrdiff_t(std::min(dirty_, buf_.size())), '\0');
+   dirty_ = 0;
+   if (buf_.size() < n) buf_.resize(n, '\0');
+}
+
+void RecordCodec::PutUint(size_t offset, size_t size, uint64_t v) {
+   Mark(offset + size);
+   for (size_t i = 0; i < size; i++) buf_[offset + i] = char(uint8_t(v >> (8 * i)));
+}
+
+void RecordCodec::PutBytes(const Field &f, std::string_view bytes, const std::string &path) {
+   if (bytes.size() > f.width)
+      Fail(path, std::to_string(bytes.size()) + " bytes do not fit the field's " + std::to_string(f.width));
+   Mark(f.offset + bytes.size());
+   std::copy(bytes.begin(), bytes.end(), buf_.begin() + f.offset);
+}
+
+// Lays one field over the buffer.  A text writes its bytes and, when it is
+// shorter than the field, one NUL: any other bytes come from "$raw".
+void RecordCodec::PutField(const Field &f, const Json &value, const std::string &path) {
+   switch (f.type) {
+   case Text: {
+      const std::string &text = ReadText(value, path);
+      if (text.size() > f.width)
+         Fail(path, "text of " + std::to_string(text.size()) + " bytes is longer than the field (" +
+                       std::to_string(f.width) + " bytes)");
+      Mark(f.offset + std::min<size_t>(text.size() + 1, f.width));
+      std::copy(text.begin(), text.end(), buf_.begin() + f.offset);
+      if (text.size() < f.width) buf_[f.offset + text.size()] = '\0';
+      return;
+   }
+   case Hex:
+   case Mac: PutBytes(f, ReadHex(value, path), path); return;
+   default: PutUint(f.offset, FieldSize(f), ReadInt(value, IntTypeOf(f.type), path));
+   }
+}
+
+std::string_view RecordCodec::Trimmed(size_t n) const {
+   return TrimmedZeros(std::string_view(buf_).substr(0, std::min(n, dirty_)));
+}
+
+RecordEntry RecordCodec::Encode(const kelplat::NodeInfo &node, const Json &value, const std::string &path,
+                                  bool allowUnlisted) {
    const RecordDef &def = *FindRecord(node.number);
    RecordEntry out;
    if (value.is_string() && (def.flags & kWholeText)) {
-      out.data.assign(node.recordSize, '\0');
-      PutField(out.data, def.fields[0], value, path);
-      TrimZeros(out.data);
+      Clear(node.recordSize);
+      PutField(def.fields[0], value, path);
+      out.data = Trimmed(node.recordSize);
       return out;
    }
    if (!value.is_object())
       Fail(path, def.flags & kWholeText ? "expected a text or an object of record fields"
                                         : "expected an object of record fields");
 
-   struct Given {
-      const Field *field;
-      const Json *value;
-      std::string path;
-   };
-   std::vector<Given> given;
+   std::vector<Given> &given = given_;
+   given.clear();
    std::optional<uint64_t> size;
    std::string raw, rawPath;
    const Json *tableText = nullptr, *unlinked = nullptr;
@@ -318,8 +325,9 @@ RecordEntry EncodeRecord(const kelplat::NodeInfo &node, const Json &value, const
    if (raw.size() > stored)
       Fail(rawPath, std::to_string(raw.size()) + " bytes do not fit a record of " + std::to_string(stored) +
                        " bytes");
-   std::string buf(std::max<size_t>(stored, node.recordSize), '\0');
-   std::copy(raw.begin(), raw.end(), buf.begin());
+   Clear(std::max<size_t>(stored, node.recordSize));
+   Mark(raw.size());
+   std::copy(raw.begin(), raw.end(), buf_.begin());
    bool haveLength = false, haveLinkState = false;
    std::optional<size_t> tableSize;
    for (const Given &g : given) {
@@ -328,55 +336,64 @@ RecordEntry EncodeRecord(const kelplat::NodeInfo &node, const Json &value, const
       if ((def.flags & kAcpiBuffer) && g.field->name == "data") {
          if (tableText != nullptr) Fail(tableTextPath, "give data or text, not both");
          std::string bytes = ReadHex(*g.value, g.path);
-         PutBytes(buf, *g.field, bytes, g.path);
+         PutBytes(*g.field, bytes, g.path);
          tableSize = bytes.size();
       } else {
-         PutField(buf, *g.field, *g.value, g.path);
+         PutField(*g.field, *g.value, g.path);
       }
    }
    if (tableText != nullptr) {
       const std::string &text = ReadText(*tableText, tableTextPath);
-      PutBytes(buf, *FindField(def, "data"), text, tableTextPath);
+      PutBytes(*FindField(def, "data"), text, tableTextPath);
       tableSize = text.size();
    }
    // Only table bytes given set the default length; "$raw" bytes stay as they are.
-   if ((def.flags & kAcpiBuffer) && !haveLength && tableSize) PutUint(buf, 5, 4, *tableSize);
+   if ((def.flags & kAcpiBuffer) && !haveLength && tableSize) PutUint(5, 4, *tableSize);
    if (unlinked != nullptr && ReadBool(*unlinked, unlinkedPath)) {
       if (haveLinkState) Fail(unlinkedPath, "give linkState or unlinked, not both");
-      PutUint(buf, 20, 4, uint32_t(-4));
+      PutUint(20, 4, uint32_t(-4));
    }
-   buf.resize(stored);
-   if (!size) TrimZeros(buf);  // the reader zero-fills short records
-   out.data = std::move(buf);
+   // The reader zero-fills short records, so without "$size" the zeros at
+   // the end are left out.
+   out.data = size ? std::string_view(buf_).substr(0, stored) : Trimmed(stored);
    return out;
 }
 
-std::optional<Json> DumpRecord(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject) {
+bool RecordCodec::EncodesBack(const kelplat::NodeInfo &node, const Json &value, const RecordEntry &entry) {
+   try {
+      return Encode(node, value, "", false).data == entry.data;
+   } catch (const SnapshotError &) {
+      return false;
+   }
+}
+
+std::optional<Json> RecordCodec::Dump(const kelplat::NodeInfo &node, const RecordEntry &entry, bool asObject) {
    const RecordDef &def = *FindRecord(node.number);
-   std::string buf = entry.data;
-   if (buf.size() < node.recordSize) buf.resize(node.recordSize, '\0');
+   // The stored bytes, zero-filled to the node's size: the buffer is kept
+   // zero past the bytes the last record put there.
+   const size_t size = std::max<size_t>(entry.data.size(), node.recordSize);
+   std::fill(stored_.begin(), stored_.begin() + ptrdiff_t(std::min(storedUsed_, stored_.size())), '\0');
+   if (stored_.size() < size) stored_.resize(size, '\0');
+   std::copy(entry.data.begin(), entry.data.end(), stored_.begin());
+   storedUsed_ = entry.data.size();
+   std::string_view stored = std::string_view(stored_).substr(0, size);
    // A failing read usually stores no bytes; then it needs no fields either.
-   Json fields = entry.data.empty() && entry.status != 0 ? Json::object() : DecodeFields(def, buf);
-   auto encodesBack = [&](const Json &j) {
-      try {
-         return EncodeRecord(node, j, "", false).data == entry.data;
-      } catch (const SnapshotError &) {
-         return false;
-      }
-   };
+   Json fields = entry.data.empty() && entry.status != 0 ? Json::object() : DecodeFields(def, stored);
 
    if (!asObject && (def.flags & kWholeText) && entry.status == 0 && !entry.setStatus &&
-       fields.contains("text") && encodesBack(fields["text"]))
+       fields.contains("text") && EncodesBack(node, fields["text"], entry))
       return fields["text"];
    // The fields alone, then with the stored size, then over the raw bytes.
-   for (int variant = 0; variant < 4; variant++) {
+   // Without statuses the first is the fields as they are.
+   if (entry.status == 0 && !entry.setStatus && EncodesBack(node, fields, entry)) return fields;
+   for (int variant = entry.status == 0 && !entry.setStatus ? 1 : 0; variant < 4; variant++) {
       Json j = Json::object();
       if (entry.status != 0) j["$status"] = FormatStatus(entry.status);
       if (entry.setStatus) j["$setStatus"] = FormatStatus(*entry.setStatus);
       if (variant & 1) j["$size"] = entry.data.size();
       if (variant & 2) j["$raw"] = ToHex(TrimmedZeros(entry.data));
       for (auto it = fields.begin(); it != fields.end(); ++it) j[it.key()] = *it;
-      if (encodesBack(j)) return j;
+      if (EncodesBack(node, j, entry)) return j;
    }
    return std::nullopt;
 }

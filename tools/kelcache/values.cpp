@@ -87,17 +87,14 @@ bool Fits(const Integer &n, IntType type) {
 
 uint64_t Bits(const Integer &n) { return n.negative ? ~n.magnitude + 1 : n.magnitude; }
 
-std::string EscapeMember(std::string_view member) {
-   std::string out;
-   for (char c : member) {
-      if (c == '~')
-         out += "~0";
-      else if (c == '/')
-         out += "~1";
-      else
-         out += c;
+// Appends a member name to a JSON pointer, '~' and '/' escaped.
+void AppendEscapedMember(std::string &out, std::string_view member) {
+   for (size_t special; (special = member.find_first_of("~/")) != std::string_view::npos;) {
+      out.append(member.substr(0, special));
+      out += member[special] == '~' ? "~0" : "~1";
+      member.remove_prefix(special + 1);
    }
-   return out;
+   out.append(member);
 }
 
 std::string FormatKeyInt(uint64_t value) {
@@ -111,7 +108,12 @@ std::string FormatKeyInt(uint64_t value) {
 void Fail(const std::string &path, std::string what) { throw SnapshotError{path, std::move(what)}; }
 
 std::string MemberPath(const std::string &path, std::string_view member) {
-   return path + "/" + EscapeMember(member);
+   std::string out;
+   out.reserve(path.size() + 1 + member.size());
+   out += path;
+   out += '/';
+   AppendEscapedMember(out, member);
+   return out;
 }
 
 std::string ElementPath(const std::string &path, size_t index) {
@@ -138,23 +140,23 @@ std::optional<uint64_t> ParseIntText(std::string_view text, IntType type) {
 
 uint64_t ReadInt(const Json &value, IntType type, const std::string &path) {
    Integer n;
-   std::string shown;
    if (value.is_number_unsigned()) {
       n.magnitude = value.get<uint64_t>();
-      shown = value.dump();
    } else if (value.is_number_integer()) {
       int64_t v = value.get<int64_t>();
       n = {v < 0, v < 0 ? ~uint64_t(v) + 1 : uint64_t(v)};
-      shown = value.dump();
    } else if (value.is_string()) {
-      shown = value.get_ref<const std::string &>();
-      std::optional<Integer> parsed = ParseInteger(shown);
-      if (!parsed) Fail(path, "\"" + shown + "\" is not an integer");
+      const std::string &text = value.get_ref<const std::string &>();
+      std::optional<Integer> parsed = ParseInteger(text);
+      if (!parsed) Fail(path, "\"" + text + "\" is not an integer");
       n = *parsed;
    } else {
       Fail(path, "expected an integer, not " + (value.is_number() ? value.dump() : value.type_name()));
    }
-   if (!Fits(n, type)) Fail(path, shown + " does not fit " + IntTypeName(type));
+   // The value as given: the text of a string, else the number as written.
+   if (!Fits(n, type))
+      Fail(path, (value.is_string() ? value.get_ref<const std::string &>() : value.dump()) + " does not fit " +
+                    IntTypeName(type));
    return Bits(n);
 }
 
