@@ -133,7 +133,15 @@ bool DocumentBuilder::key(std::string &name) {
    return true;
 }
 
-constexpr uint64_t kMaxCacheSize = 256u << 20;
+// What a snapshot may make: 256 MiB, or sixteen times its own size when
+// that is more (a host of a million worlds makes a file of about 900 MB
+// from 650 MB of JSON), so that a small snapshot of long patterns cannot
+// take gigabytes of memory; never as much as 4 GiB, the most a cache file's
+// offsets reach.
+uint64_t CacheSizeLimit(uint64_t textSize) {
+   constexpr uint64_t kFloor = 256u << 20, kCeiling = uint64_t(4095) << 20;
+   return std::min(std::max(kFloor, textSize * 16), kCeiling);
+}
 
 // {} (or an object of "$unlisted" alone) as the value of an instance.
 bool IsEmptyInstance(const Json &value) {
@@ -151,7 +159,7 @@ Key MetaKey(std::string_view name) { return Key{KEL_PARAM_STRING, 0, std::string
 class Builder {
 public:
    // Entries go to cache->writer; the header's fields to the others.
-   explicit Builder(SnapshotCache &cache) : cache_(cache) {
+   Builder(SnapshotCache &cache, uint64_t textSize) : cache_(cache), limit_(CacheSizeLimit(textSize)) {
       cache_.signature = DefaultSignature();
       cache_.buildDate = "unknown";
    }
@@ -202,7 +210,8 @@ private:
       // Each record and content is capped; so is their sum, so that no
       // snapshot makes a file of gigabytes.
       total_ += lookup.size() + data.size();
-      if (total_ > kMaxCacheSize) Fail(path, "makes the cache file larger than 256 MiB");
+      if (total_ > limit_)
+         Fail(path, "makes the cache file larger than " + std::to_string(limit_ >> 20) + " MiB");
       if (!cache_.writer.Add(lookup, status, data))
          Fail(path, "makes an entry that another member made already");
    }
@@ -214,6 +223,7 @@ private:
    RecordCodec records_;
    std::vector<Key> keys_;  // the instance keys down to the current position
    uint64_t total_ = 0;
+   const uint64_t limit_;
 };
 
 void Builder::TopMember(const std::string &name, Json &value) {
@@ -529,7 +539,7 @@ bool ReadSnapshot(const std::string &jsonText, SnapshotCache *cache, std::string
       if (!TheNodeTree().error.empty()) {
          message = "node table: " + TheNodeTree().error;
       } else {
-         Builder builder(*cache);
+         Builder builder(*cache, jsonText.size());
          StreamingReader reader(builder);
          Json::sax_parse(jsonText, &reader);
          reader.Finish();
