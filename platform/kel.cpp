@@ -66,8 +66,9 @@ struct Tree {
    std::string lookup;
 };
 
-// Set up before any code runs, so that a call needs no guard to reach it.
-constinit Tree gTree;
+// Set up before main runs, so that a call needs no guard to reach it (no
+// call is made while static objects are being set up).
+Tree gTree;
 
 Tree &TheTree() { return gTree; }
 
