@@ -163,20 +163,22 @@ def main():
                                  args.runs * 3)
         row("halvex -v, 100k-world cache", ours, ref, "halvex -v, example host", goal=1.2)
 
+        # The 3 s and 3x goals hold at 100,000 worlds; beyond, the time should
+        # grow with the size (at most 11x per 10x) and the memory stay at 3x.
+        cpu100k = {}
         for n in sizes[2:]:
             json_mb = os.path.getsize(jsons[n]) / 1e6
-            cpu, _, rss = run([kelcache, "build", jsons[n], "-o", os.path.join(tmp, "again.cache")])
-            row("kelcache build, %dk worlds" % (n // 1000), cpu, 3.0, "goal 3 s", unit="s ", goal=1)
-            row("  peak memory", rss / 1024, json_mb * 3, "3x the JSON (%.0f MB)" % json_mb,
-                unit="MB", goal=1)
-            cpu, _, rss = run([kelcache, "dump", caches[n]])
-            row("kelcache dump, %dk worlds" % (n // 1000), cpu, 3.0, "goal 3 s", unit="s ", goal=1)
-            row("  peak memory", rss / 1024, json_mb * 3, "3x the JSON (%.0f MB)" % json_mb,
-                unit="MB", goal=1)
-        if args.million:
-            b10, b100 = builds[100000][0], builds[1000000][0]
-            row("kelcache build, 1M worlds", b100, b10, "the same, 100k worlds", unit="s ", goal=11)
-
+            for what, argv in (("build", [kelcache, "build", jsons[n], "-o", os.path.join(tmp, "again.cache")]),
+                               ("dump", [kelcache, "dump", caches[n]])):
+                cpu, _, rss = run(argv)
+                label = "kelcache %s, %dk worlds" % (what, n // 1000)
+                if n == 100000:
+                    cpu100k[what] = cpu
+                    row(label, cpu, 3.0, "goal 3 s", unit="s ", goal=1)
+                else:
+                    row(label, cpu, cpu100k[what], "the same, 100k worlds", unit="s ", goal=11)
+                row("  peak memory", rss / 1024, json_mb * 3, "3x the JSON (%.0f MB)" % json_mb,
+                    unit="MB", goal=1)
         rss = max(run([tool, "-c", big, "ps", "-J"])[2] for _ in range(3))
         print("%-34s %10.1f MB  (cache file %.1f MB mapped)" % ("ps -J peak memory, 100k worlds", rss / 1024,
                                                                  os.path.getsize(big) / 1e6))
