@@ -225,32 +225,34 @@ uint8_t *CacheWriter::Allocate(size_t n) {
    return at;
 }
 
-// The index's place for a tag: the tag's top bits, spread.
-static size_t IndexHome(uint32_t tag, size_t mask) { return size_t(uint32_t(tag * 0x9e3779b1u)) & mask; }
-
-void CacheWriter::GrowIndex() {
-   std::vector<uint64_t> grown(std::max<size_t>(index_.size() * 2, 1024), 0);
+void TagIndex::Grow() {
+   std::vector<uint64_t> grown(std::max<size_t>(slots_.size() * 2, 1024), 0);
    const size_t mask = grown.size() - 1;
-   for (uint64_t v : index_) {
+   for (uint64_t v : slots_) {
       if (v == 0) continue;
-      size_t i = IndexHome(uint32_t(v >> 32), mask);
+      size_t i = Home(uint32_t(v >> 32), mask);
       while (grown[i] != 0) i = (i + 1) & mask;
       grown[i] = v;
    }
-   index_ = std::move(grown);
+   slots_ = std::move(grown);
+}
+
+void TagIndex::Insert(uint32_t tag, uint32_t number) {
+   if ((used_ + 1) * 4 > slots_.size() * 3) Grow();
+   const size_t mask = slots_.size() - 1;
+   size_t i = Home(tag, mask);
+   while (slots_[i] != 0) i = (i + 1) & mask;
+   slots_[i] = uint64_t(tag) << 32 | number;
+   used_++;
 }
 
 bool CacheWriter::Add(std::string_view lookup, uint32_t status, std::string_view data) {
    const uint32_t tag = uint32_t(KeyHash(lookup) >> 32);
-   if ((count_ + 1) * 4 > index_.size() * 3) GrowIndex();
-   const size_t mask = index_.size() - 1;
-   size_t i = IndexHome(tag, mask);
-   for (; index_[i] != 0; i = (i + 1) & mask) {
-      if (uint32_t(index_[i] >> 32) != tag) continue;
-      const Entry &e = At(size_t(uint32_t(index_[i])) - 1);
-      if (e.keyLen == lookup.size() && std::memcmp(e.bytes + kEntryHeadSize, lookup.data(), lookup.size()) == 0)
-         return false;
-   }
+   auto sameKey = [&](uint32_t number) {
+      const Entry &e = At(number - 1);
+      return e.keyLen == lookup.size() && std::memcmp(e.bytes + kEntryHeadSize, lookup.data(), lookup.size()) == 0;
+   };
+   if (index_.Find(tag, sameKey) != 0) return false;
    if ((count_ & (kEntryBlock - 1)) == 0) entryBlocks_.emplace_back(new Entry[kEntryBlock]);
    const size_t size = kEntryHeadSize + lookup.size() + data.size();
    uint8_t *bytes = Allocate(size);
@@ -259,7 +261,7 @@ bool CacheWriter::Add(std::string_view lookup, uint32_t status, std::string_view
    if (!data.empty()) std::memcpy(bytes + kEntryHeadSize + lookup.size(), data.data(), data.size());
    entryBlocks_.back()[count_ & (kEntryBlock - 1)] = {bytes, uint32_t(lookup.size()), uint32_t(data.size()), tag,
                                                       uint32_t(HomeHash(lookup))};
-   index_[i] = uint64_t(tag) << 32 | uint64_t(count_ + 1);
+   index_.Insert(tag, uint32_t(count_ + 1));
    count_++;
    totalBytes_ += size;
    return true;

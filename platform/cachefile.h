@@ -160,10 +160,34 @@ uint32_t HeaderCheck(const uint8_t *header);
 // opening needs, in time independent of the file's size.
 constexpr int kCacheQuickOpen = 0x100;
 
+// A hash table of numbers (1 or more) filed under 32-bit tags, to find a
+// repeated key without keeping a copy of it: the caller compares the
+// candidates a tag leads to.  Linear probing, at most three quarters full.
+class TagIndex {
+public:
+   // The first number filed under tag for which same(number) holds, or 0.
+   template <class Same>
+   uint32_t Find(uint32_t tag, Same same) const {
+      if (slots_.empty()) return 0;
+      const size_t mask = slots_.size() - 1;
+      for (size_t i = Home(tag, mask); slots_[i] != 0; i = (i + 1) & mask)
+         if (uint32_t(slots_[i] >> 32) == tag && same(uint32_t(slots_[i]))) return uint32_t(slots_[i]);
+      return 0;
+   }
+   void Insert(uint32_t tag, uint32_t number);
+
+private:
+   // A tag's first slot: its bits spread over the table.
+   static size_t Home(uint32_t tag, size_t mask) { return size_t(uint32_t(tag * 0x9e3779b1u)) & mask; }
+   void Grow();
+   std::vector<uint64_t> slots_;  // (tag << 32) | number, 0 for an empty slot
+   size_t used_ = 0;
+};
+
 // Builds a cache file.  Entries are kept as the file stores them (status,
 // key, data) back to back in large blocks, with a small fixed-size record
-// each; a key added twice is found through an open-addressing table of
-// entry numbers tagged with the key's hash, so no key is copied twice.  The
+// each; a key added twice is found through a TagIndex of entry numbers
+// tagged with the key's hash, so no key is copied twice.  The
 // file is made only at the end: WriteTo streams it to a file through a
 // modest buffer, so that its bytes are never all in memory at once; Finish
 // makes it as one string.
@@ -199,7 +223,6 @@ private:
 
    const Entry &At(size_t i) const { return entryBlocks_[i >> kEntryBlockBits][i & (kEntryBlock - 1)]; }
    uint8_t *Allocate(size_t n);
-   void GrowIndex();
    template <class Sink>
    void Stream(Sink &sink, std::span<const uint8_t, 16> signature, std::string_view buildDate) const;
 
@@ -210,9 +233,8 @@ private:
    std::vector<std::unique_ptr<uint8_t[]>> byteBlocks_;
    uint8_t *free_ = nullptr;
    size_t freeLen_ = 0;
-   // Open addressing with linear probing: (tag << 32) | (entry number + 1),
-   // 0 for an empty place; at most three quarters full.
-   std::vector<uint64_t> index_;
+   // Entry number + 1 by the tag of its key.
+   TagIndex index_;
    uint64_t totalBytes_ = 0;  // of all entries, as the file stores them
 };
 

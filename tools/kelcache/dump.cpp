@@ -261,7 +261,6 @@ private:
    // Whether place p is the instance with this key as stored.
    bool IsInstance(const Place &p, std::string_view key) const;
    Key KeyOf(const Place &p) const;
-   void GrowIndex();
    // keyLen: the length of the keys of entries at pos (3 and the instance
    // keys above).
    void Emit(int pos, uint32_t place, bool unlisted, TextOut &out, int depth, size_t keyLen);
@@ -273,9 +272,9 @@ private:
    // Entry j (the entry of the j-th occupied slot): its place in key order.
    std::vector<uint32_t> rank_;
    std::vector<Place> places_;  // the root first
-   // Instances by parent and key: open addressing, (tag << 32) | place.
-   std::vector<uint64_t> index_;
-   size_t instances_ = 0;
+   // Instances by the tag of their parent and key: their places (never
+   // the root, so never 0).
+   kelplat::TagIndex index_;
    std::unordered_map<uint32_t, uint32_t> sets_;  // a record's place: the slot of its set answer
    std::vector<bool> done_;                       // instances written as listed
    // The places the last Reach below each top-level name passed, by depth:
@@ -512,30 +511,12 @@ uint32_t Dumper::FixedChild(uint32_t place, int pos) const {
 static uint32_t InstanceTag(uint32_t parent, std::string_view key) {
    return uint32_t((kelplat::KeyHash(key) ^ (uint64_t(parent) * 0x9e3779b97f4a7c15ULL)) >> 32);
 }
-static size_t IndexHome(uint32_t tag, size_t mask) { return size_t(uint32_t(tag * 0x9e3779b1u)) & mask; }
-
 uint32_t Dumper::Instance(uint32_t parent, std::string_view key) const {
-   if (index_.empty()) return kNone;
-   const uint32_t tag = InstanceTag(parent, key);
-   const size_t mask = index_.size() - 1;
-   for (size_t i = IndexHome(tag, mask); index_[i] != 0; i = (i + 1) & mask) {
-      if (uint32_t(index_[i] >> 32) != tag) continue;
-      const Place &p = places_[uint32_t(index_[i])];
-      if (p.parent == parent && IsInstance(p, key)) return uint32_t(index_[i]);
-   }
-   return kNone;
-}
-
-void Dumper::GrowIndex() {
-   std::vector<uint64_t> grown(std::max<size_t>(index_.size() * 2, 1024), 0);
-   const size_t mask = grown.size() - 1;
-   for (uint64_t v : index_) {
-      if (v == 0) continue;
-      size_t i = IndexHome(uint32_t(v >> 32), mask);
-      while (grown[i] != 0) i = (i + 1) & mask;
-      grown[i] = v;
-   }
-   index_ = std::move(grown);
+   uint32_t n = index_.Find(InstanceTag(parent, key), [&](uint32_t place) {
+      const Place &p = places_[place];
+      return p.parent == parent && IsInstance(p, key);
+   });
+   return n != 0 ? n : kNone;
 }
 
 bool Dumper::IsInstance(const Place &p, std::string_view key) const {
@@ -575,13 +556,7 @@ uint32_t Dumper::AddPlace(uint32_t parent, std::string_view key) {
    p.nextSibling = places_[parent].firstChild;
    places_.push_back(p);
    places_[parent].firstChild = n;
-   if ((instances_ + 1) * 4 > index_.size() * 3) GrowIndex();
-   const uint32_t tag = InstanceTag(parent, key);
-   const size_t mask = index_.size() - 1;
-   size_t i = IndexHome(tag, mask);
-   while (index_[i] != 0) i = (i + 1) & mask;
-   index_[i] = uint64_t(tag) << 32 | n;
-   instances_++;
+   index_.Insert(InstanceTag(parent, key), n);
    return n;
 }
 
