@@ -15,6 +15,12 @@ cache: a cycle through a world whose ID is 0.
                              "info": {"worldId": 3000, "userspaceId": 128, "cartelId": 3000, "type": 4}}},
           "userworld": {"cartel": {"1500": {"cmdline": "/sbin/init --second", "child": {}},
                                    "3000": {"cmdline": "far", "child": {}}}}}}
+=== snapshot three-far-roots extends two-roots
+{"tree": {"world": {"3100": {"name": "far-b",
+                             "info": {"worldId": 3100, "userspaceId": 300, "cartelId": 3100, "type": 4}}},
+          "userworld": {"cartel": {"3100": {"cmdline": "far b", "child": {}}}}}}
+=== snapshot far-roots-then-failure extends three-far-roots
+{"tree": {"userworld": {"cartel": {"3100": {"child": {"3101": {"$status": "0xbad0062"}}}}}}}
 === snapshot four-levels extends host
 {"tree": {"world": {"1220": {"name": "tail",
                              "info": {"worldId": 1220, "userspaceId": 1, "cartelId": 1220,
@@ -337,3 +343,24 @@ exit: 0
   \x0ex\x0f \x0em\x0f\x0eq\x0f2004  2002  syslogd-writer  WAIT    IO      0-3      16.386039  /usr/sbin/syslogd -n
   \x0em\x0f\x0eq\x0f2003  2003  ntpd            WAIT    TIMER   0-3      46.913722  /usr/sbin/ntpd -g -n -c /etc/ntp.conf
 
+=== case each root beyond the table is warned about once
+snapshot: three-far-roots
+run: ps -u -U2 -i
+exit: 0
+--- stdout
+WID   CID   WorldName      UserSpace
+2001  2001  init           2        
+2050  2050  logger-daemon  2        
+
+Total worlds:         14
+Total printed worlds: 11
+Total userspaces:     2
+--- stderr
+Warning: maximum number of userspaces reached...
+Warning: maximum number of userspaces reached...
+=== case a gathering that fails after such roots writes no warning
+snapshot: far-roots-then-failure
+run: ps -J
+exit: 1
+--- stderr
+failed to get child info for child 3101, status No such cartel
