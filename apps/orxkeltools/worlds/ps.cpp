@@ -171,8 +171,6 @@ struct WorldNode {
    bool isZombie;
 };
 
-WorldNode NewNode() { return WorldNode{}; }
-
 // A node's place in its cartel tree, kept apart from the node so that
 // linking and drawing walk a small array.  Links are node indexes, -1 for
 // none.
@@ -435,7 +433,7 @@ bool KeepWorld(WorldTable &t, CartelChildren &seen, const WorldNode &n) {
       uint32_t childId = uint32_t(seen.zombieIds[children.firstZombie + i]);
       WorldNode *z = AppendNode(t);
       if (z == nullptr) return NoZombieMemory();
-      *z = NewNode();
+      *z = WorldNode{};
       z->isZombie = true;
       z->worldId = z->cartelId = childId;
       z->parentCartelId = n.cartelId;
@@ -457,7 +455,7 @@ bool GatherWorlds(WorldTable &t) {
    KEL_Node listNode = (t.options & kOptCartels) ? KEL_NODE_userworld_cartel : KEL_NODE_world;
    WalkResult walk = ForEachInstance(listNode, keys.get(), [&](const KEL_Param *) {
       t.totalWorlds++;
-      WorldNode n = NewNode();
+      WorldNode n{};
       Gathered result = ReadWorld(t, keys.get(), cartelKeys.get(), n);
       if (result == Gathered::Kept && !KeepWorld(t, seen, n)) result = Gathered::Failed;
       return result != Gathered::Failed;
@@ -598,23 +596,14 @@ void PrintPsRow(const Printer &p, const WorldNode &n, const TreeLink *link) {
    int w = p.idWidth, m = int(t.longestName);
    bool zombie = n.isZombie;
    uint32_t cartel = n.cartelId;
-   if (cartel == 0 || zombie) {
-      std::printf("%-*d", std::max(w, 0), int32_t(n.worldId));
-      if (cartel == 0)
-         std::printf("%-*s", w + 2, "  0");
-      else
-         PrintIdColumn(w, int32_t(cartel));
-      if (zombie) std::printf("%-*s", m + 2, "  <zombie>");
-   }
-   if (!zombie) {
-      // The common row: its first three columns in one call.
-      std::string_view name = t.texts.Get(n.name);
-      if (cartel == 0)
-         std::printf("  %-*.*s", m, int(name.size()), name.data());
-      else
-         std::printf("%-*d  %-*d  %-*.*s", std::max(w, 0), int32_t(n.worldId), std::max(w - 2, 0),
-                     int32_t(cartel), m, int(name.size()), name.data());
-   }
+   // The first three columns in one call.
+   std::string_view name = zombie ? std::string_view("<zombie>") : t.texts.Get(n.name);
+   if (cartel == 0)
+      std::printf("%-*d%-*s  %-*.*s", std::max(w, 0), int32_t(n.worldId), w + 2, "  0", m, int(name.size()),
+                  name.data());
+   else
+      std::printf("%-*d  %-*d  %-*.*s", std::max(w, 0), int32_t(n.worldId), std::max(w - 2, 0), int32_t(cartel), m,
+                  int(name.size()), name.data());
    if ((o & kOptChildren) && (o & kOptTree) && !zombie) std::printf("  %-9d", link->nChildren);
    if ((o & kOptThreads) && (o & kOptTree) && !zombie) std::printf("  %-8d", link->nThreads);
    if ((o & kOptGid) && !zombie) PrintIdColumn(w, n.groupId);
