@@ -132,20 +132,21 @@ constexpr uint64_t kHomeBlock = 16, kHomeSpacing = 16;
 inline uint64_t HomeHash(std::string_view key) {
    const auto *p = reinterpret_cast<const uint8_t *>(key.data());
    const size_t n = key.size(), start = std::min<size_t>(n, 3);
+   auto whole = [&] { return Checksum(p + start, n - start); };
    // Find the last instance key; a key that does not parse is hashed whole.
    size_t at = start, last = n;
    while (at < n) {
       last = at;
       size_t rest = n - at;
       if (p[at] == KEL_PARAM_STRING) {
-         if (rest < 5 || rest - 5 < LoadU32(p + at + 1)) return Checksum(p + start, n - start);
+         if (rest < 5 || rest - 5 < LoadU32(p + at + 1)) return whole();
          at += 5 + LoadU32(p + at + 1);
       } else {
-         if (rest < 9) return Checksum(p + start, n - start);
+         if (rest < 9) return whole();
          at += 9;
       }
    }
-   if (last == n || p[last] == KEL_PARAM_STRING) return Checksum(p + start, n - start);
+   if (last == n || p[last] == KEL_PARAM_STRING) return whole();
    uint64_t value = LoadU64(p + last + 1);
    uint64_t h = Checksum(p + start, last - start) ^ ((value / kHomeBlock) * 0x9e3779b97f4a7c15ULL);
    h = (h ^ (h >> 32)) * 0xd6e8feb86659fd93ULL;
