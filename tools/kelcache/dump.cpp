@@ -429,7 +429,7 @@ bool Dumper::Run(TextOut &out, KEL_Status *status) {
 bool Dumper::PlaceListing(const Entry &e, const Lookup &l, uint32_t slot, uint32_t rank) {
    const NodeInfo *node = kelplat::FindNode(l.node);
    if (node == nullptr || !kelplat::EndsWithLevel(node->path) ||
-       l.keys.size() + 1 != kelplat::LevelCount(node->path))
+       l.keys.size() + 1 != node->levels)
       return false;
    if (!kelplat::DecodeList(e.data, &listed_)) return false;
    // Every listed key needs a member name, and each is listed once.
@@ -448,7 +448,7 @@ bool Dumper::PlaceListing(const Entry &e, const Lookup &l, uint32_t slot, uint32
 
 bool Dumper::PlaceRead(const Entry &e, const Lookup &l, uint32_t rank) {
    const NodeInfo *node = kelplat::FindNode(l.node);
-   if (node == nullptr || l.keys.size() != kelplat::LevelCount(node->path)) return false;
+   if (node == nullptr || l.keys.size() != node->levels) return false;
    if (l.op == Op::Data) {
       if (!(node->flags & kelplat::KEL_NF_DATA) || !DumpData(e.status, e.data, true)) return false;
    } else {
@@ -466,7 +466,7 @@ bool Dumper::PlaceRead(const Entry &e, const Lookup &l, uint32_t rank) {
 bool Dumper::PlaceSet(const Entry &e, const Lookup &l, uint32_t slot) {
    const NodeInfo *node = kelplat::FindNode(l.node);
    if (node == nullptr || !(node->flags & kelplat::KEL_NF_SET) || node->recordSize == 0 ||
-       (node->flags & kelplat::KEL_NF_DATA) || !e.data.empty() || l.keys.size() != kelplat::LevelCount(node->path) ||
+       (node->flags & kelplat::KEL_NF_DATA) || !e.data.empty() || l.keys.size() != node->levels ||
        !Representable(l.keys))
       return false;
    uint32_t place = Reach(tree_.nodePosition[l.node], l.keys, kNone);
